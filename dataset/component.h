@@ -1,0 +1,36 @@
+#pragma once
+
+#include <string>
+#include <utility>
+
+namespace initialiser {
+
+// One kind of time-zone data in a data set. It knows the data set's folder, whether its data fit
+// the installed system, and how to point the system's links for its kind of data at itself.
+class vorl_dataset_component {
+public:
+    // True when this component's data can be used with those of `other`, the component at the same
+    // place in the system data set. Changes nothing; may print; never throws.
+    virtual bool compatible_schema(const vorl_dataset_component& other) const = 0;
+
+    // Removes the old links for this kind of data, then makes the new one where the kind has one.
+    // A failed removal is printed and passed over; a failed creation throws its error number and
+    // leaves on disk what was done so far.
+    virtual void install_links() const = 0;
+
+    vorl_dataset_component(const vorl_dataset_component&) = delete;
+    vorl_dataset_component& operator=(const vorl_dataset_component&) = delete;
+
+protected:
+    vorl_dataset_component() = default;
+    explicit vorl_dataset_component(std::string path) : dataset_path(std::move(path)) {}
+
+    // Not virtual, and out of reach: a component is destroyed as its own kind, by the shared
+    // pointer that was made for that kind.
+    ~vorl_dataset_component() = default;
+
+    // The data set's folder, as it was given; empty for the system data set.
+    const std::string dataset_path;
+};
+
+} // namespace initialiser

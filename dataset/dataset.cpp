@@ -1,0 +1,69 @@
+#include "dataset/dataset.h"
+
+#include "dataset/icu.h"
+#include "dataset/zoneinfo.h"
+#include "foundation/paths.h"
+
+#include <err.h>
+
+#include <algorithm>
+#include <stdexcept>
+
+namespace initialiser {
+namespace {
+
+// The system's tz database names its tz release only; its data count as that release's first.
+constexpr auto system_version_suffix = ".1.0";
+
+bool is_among_stored_datasets(const std::string& path) {
+    return path.size() > stored_datasets.size() && path.starts_with(stored_datasets);
+}
+
+} // namespace
+
+vorl_dataset::vorl_dataset() : vorl_dataset(std::string{}) {}
+
+vorl_dataset::vorl_dataset(const std::string& folder) : path(folder) {
+    create_components();
+}
+
+void vorl_dataset::create_components() {
+    const auto zoneinfo = std::make_shared<vorl_zoneinfo>(path);
+    if (path.empty()) {
+        version_text_ = zoneinfo->version_text() + system_version_suffix;
+    } else if (is_among_stored_datasets(path)) {
+        version_text_ = path.substr(stored_datasets.size());
+    } else {
+        warn("vorl_dataset::create_components: bad path %s", path.c_str());
+        throw std::invalid_argument("badpath");
+    }
+    version.parse(version_text_);
+    components.push_back(zoneinfo);
+    components.push_back(std::make_shared<vorl_icu>(path));
+}
+
+bool vorl_dataset::compatible_with(const vorl_dataset& other) const {
+    return std::equal(
+        components.begin(), components.end(), other.components.begin(), other.components.end(),
+        [](const auto& own, const auto& others) { return own->compatible_schema(*others); });
+}
+
+bool vorl_dataset::newer_than(const vorl_dataset& other) const {
+    return version.newer_than(other.version);
+}
+
+bool vorl_dataset::same_path(const vorl_dataset& other) const {
+    return path == other.path;
+}
+
+void vorl_dataset::activate() const {
+    for (const auto& component : components) {
+        component->install_links();
+    }
+}
+
+void vorl_dataset::reset_to_system() {
+    vorl_dataset{}.activate();
+}
+
+} // namespace initialiser

@@ -1,0 +1,51 @@
+#pragma once
+
+#include "dataset/component.h"
+#include "foundation/version.h"
+
+#include <memory>
+#include <string>
+#include <vector>
+
+namespace initialiser {
+
+// One complete set of time-zone data: where it lies, its version, and its two components. The empty
+// path is the system data set; any other is a stored data set's folder, named by its version text.
+// A data set is complete when it is built and never changes; it is never copied.
+class vorl_dataset {
+public:
+    // Builds the system data set, or the one in `folder`. Prints "vorl_dataset::create_components:
+    // bad path PATH" and throws std::invalid_argument ("badpath") when the path is neither empty
+    // nor a folder among the stored data sets; passes on what building the version and the
+    // components prints and throws.
+    vorl_dataset();
+    explicit vorl_dataset(const std::string& folder);
+    vorl_dataset(const vorl_dataset&) = delete;
+    vorl_dataset& operator=(const vorl_dataset&) = delete;
+
+    // True when each component is compatible with the other data set's at the same place.
+    bool compatible_with(const vorl_dataset& other) const;
+    bool newer_than(const vorl_dataset& other) const;
+    bool same_path(const vorl_dataset& other) const;
+
+    // Points the system's links at this data set: the zoneinfo link, then the ICU link. The first
+    // link that can't be made ends it with a thrown error number; what was done before stays done.
+    void activate() const;
+
+    // The version as text, for messages and records: a stored data set's folder name, or the
+    // system's tz release followed by ".1.0".
+    std::string version_text() const { return version_text_; }
+
+    // Builds a fresh system data set and activates it. Throws what either throws.
+    static void reset_to_system();
+
+private:
+    void create_components();
+
+    vorl_version version;
+    std::string version_text_;
+    std::string path;
+    std::vector<std::shared_ptr<vorl_dataset_component>> components;
+};
+
+} // namespace initialiser

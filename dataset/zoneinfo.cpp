@@ -1,0 +1,36 @@
+#include "dataset/zoneinfo.h"
+
+#include "foundation/file_system.h"
+#include "foundation/paths.h"
+#include "foundation/text_file.h"
+
+#include <err.h>
+
+namespace initialiser {
+
+vorl_zoneinfo::vorl_zoneinfo() : vorl_zoneinfo(std::string{}) {}
+
+vorl_zoneinfo::vorl_zoneinfo(const std::string& path)
+    : vorl_dataset_component(path),
+      zoneinfo_path(path.empty() ? system_zoneinfo : path + "/" + zoneinfo_folder) {
+    read_version();
+}
+
+void vorl_zoneinfo::read_version() {
+    version_text_ = read_first_word(zoneinfo_path + "/" + version_file);
+}
+
+bool vorl_zoneinfo::compatible_schema(const vorl_dataset_component& /*other*/) const {
+    return true;
+}
+
+void vorl_zoneinfo::install_links() const {
+    try {
+        remove(zoneinfo_link);
+    } catch (...) {
+        warn("Unlink of zoneinfo softlink failed");
+    }
+    create_symlink(zoneinfo_path, zoneinfo_link);
+}
+
+} // namespace initialiser

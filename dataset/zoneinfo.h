@@ -1,0 +1,34 @@
+#pragma once
+
+#include "dataset/component.h"
+
+#include <string>
+
+namespace initialiser {
+
+// A data set's compiled tz database: a folder of zone files with a "+VERSION" file at its top.
+class vorl_zoneinfo final : public vorl_dataset_component {
+public:
+    // Finds the database of the data set at `path`, or of the system data set, and reads its
+    // version. A missing or unreadable database is no error.
+    vorl_zoneinfo();
+    explicit vorl_zoneinfo(const std::string& path);
+
+    // Always true: compiled zone files have one format.
+    bool compatible_schema(const vorl_dataset_component& other) const override;
+
+    // Points the zoneinfo link at the database, whether or not it exists. Prints "Unlink of
+    // zoneinfo softlink failed" when the old link stays.
+    void install_links() const override;
+
+    // The first word of the "+VERSION" file, a tz release such as 2019c; empty when there is none.
+    std::string version_text() const { return version_text_; }
+
+private:
+    void read_version();
+
+    std::string zoneinfo_path;
+    std::string version_text_;
+};
+
+} // namespace initialiser

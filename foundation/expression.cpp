@@ -1,0 +1,64 @@
+#include "foundation/expression.h"
+
+#include <locale>
+#include <regex>
+
+namespace initialiser {
+namespace {
+
+// Text as bytes: each stands for itself, none is ever looked up in a locale.
+class byte_traits {
+public:
+    using char_type = char;
+    using string_type = std::string;
+    using locale_type = std::locale;
+    using char_class_type = unsigned char; // no class is known: always 0
+
+    static std::size_t length(const char* text) { return std::char_traits<char>::length(text); }
+    static char translate(char byte) { return byte; }
+    static char translate_nocase(char byte) { return byte; }
+    template <typename iterator> static std::string transform(iterator first, iterator last) {
+        return {first, last};
+    }
+    template <typename iterator>
+    static std::string transform_primary(iterator first, iterator last) {
+        return {first, last};
+    }
+    template <typename iterator>
+    static std::string lookup_collatename(iterator /*first*/, iterator /*last*/) {
+        return {};
+    }
+    template <typename iterator>
+    static char_class_type lookup_classname(iterator /*first*/, iterator /*last*/,
+                                            bool /*any_case*/ = false) {
+        return 0;
+    }
+    static bool isctype(char /*byte*/, char_class_type /*classes*/) { return false; }
+    static int value(char digit, int /*radix*/) {
+        return digit >= '0' && digit <= '9' ? digit - '0' : -1;
+    }
+    static locale_type imbue(const locale_type& /*locale*/) { return std::locale::classic(); }
+    static locale_type getloc() { return std::locale::classic(); }
+};
+
+} // namespace
+
+struct vorl_expression::automaton {
+    std::basic_regex<char, byte_traits> regex;
+};
+
+vorl_expression::vorl_expression(const char* pattern)
+    : automaton_(new automaton{std::basic_regex<char, byte_traits>{
+          pattern, std::regex_constants::ECMAScript | std::regex_constants::__polynomial}}) {}
+
+vorl_expression::~vorl_expression() = default;
+
+std::vector<std::string> vorl_expression::match_whole(const std::string& text) const {
+    std::smatch groups;
+    if (!std::regex_match(text, groups, automaton_->regex)) {
+        return {};
+    }
+    return {groups.begin(), groups.end()};
+}
+
+} // namespace initialiser

@@ -1,0 +1,44 @@
+#pragma once
+
+#include <string>
+
+// Every fixed path and name on the device, written once. They are strings and not literals so that
+// none of them can slip into a C call by accident.
+namespace initialiser {
+
+// The storage area: what the updater and the initialiser keep, and the rest of the system reads.
+inline const std::string storage_area = "/var/db/timezone/";
+inline const std::string stored_datasets =
+    "/var/db/timezone/tz/"; // one folder each, named by version
+
+// The links through which the system reads its time-zone data.
+inline const std::string zoneinfo_link = "/var/db/timezone/zoneinfo";
+inline const std::string icu_link = "/var/db/timezone/icutz"; // absent: the system's own ICU files
+inline const std::string localtime_link = "/var/db/timezone/localtime";
+inline const std::string latest_link = "/var/db/timezone/tz_latest"; // the updater's offer
+
+// What a start-up leaves for the programs that clean up and report.
+inline const std::string cleanup_marker = "/var/db/timezone/needs_cleanup";
+inline const std::string version_diff_record = "/var/db/timezone/TZVersionDiffRecord";
+
+// Left behind by older systems.
+inline const std::string legacy_icu_link = "/var/db/icutz";
+inline const std::string legacy_item = "/var/db/icu";
+
+// The system data set, read-only and installed with the operating system.
+inline const std::string system_zoneinfo = "/usr/share/zoneinfo.default";
+inline const std::string system_icu = "/usr/share/icu";
+
+// Inside a data set.
+inline const std::string zoneinfo_folder = "zoneinfo";
+inline const std::string icu_folder = "icutz";
+inline const std::string version_file = "+VERSION";       // in a tz database: its tz release
+inline const std::string schema_file = "icutzformat.txt"; // in the system's ICU folder: its schema
+
+// The localtime link's zone when it names none that can be used, and where zones were looked up
+// before the storage area existed.
+inline const std::string default_zone = "America/Los_Angeles";
+inline const std::string default_localtime = "/var/db/timezone/zoneinfo/America/Los_Angeles";
+inline const std::string old_zoneinfo = "/usr/share/zoneinfo";
+
+} // namespace initialiser

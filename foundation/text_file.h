@@ -1,0 +1,18 @@
+#pragma once
+
+#include <string>
+
+// Small text files. Neither operation waits, prints or acts on a device, whatever stands at the
+// path.
+namespace initialiser {
+
+// The first word of the file at `path`, links followed: leading white space is skipped, the next
+// white space or the end of the file ends it, and its length has no limit. A missing file is no
+// error: that, a file that can't be read, and anything but a regular file give the empty text.
+std::string read_first_word(const std::string& path);
+
+// Makes `text` the whole content of the regular file at `path`, creating it with mode 0666 less the
+// mask. Where anything else stands, a link included, or on any failure: nothing is said.
+void write_text(const std::string& path, const std::string& text);
+
+} // namespace initialiser

@@ -1,0 +1,54 @@
+#include "startup/process_guards.h"
+
+#include <fcntl.h>
+#include <sys/resource.h>
+#include <unistd.h>
+
+#include <algorithm>
+#include <cerrno>
+#include <csignal>
+#include <cstdio>
+
+namespace initialiser {
+namespace {
+
+// Enough for any text that could be meant (a version word of 30 million bytes), and far below what
+// would take the memory from the rest of the system.
+constexpr rlim_t memory_bound = rlim_t{256} << 20U;
+
+// Fills the closed ones of descriptors 0 to 2 with one that can neither be read nor written. The
+// root folder serves since a bare root has no /dev/null.
+void occupy_standard_descriptors() noexcept {
+    int filler = 0;
+    while (filler >= 0 && filler <= STDERR_FILENO) {
+        filler = ::open("/", O_PATH | O_CLOEXEC);
+    }
+    if (filler > STDERR_FILENO) {
+        ::close(filler);
+    }
+}
+
+void bound_memory() noexcept {
+#ifndef __SANITIZE_ADDRESS__ // whose shadow memory is far larger
+    rlimit data{};
+    if (::getrlimit(RLIMIT_DATA, &data) == 0) {
+        data.rlim_cur = std::min(data.rlim_cur, memory_bound);
+        static_cast<void>(::setrlimit(RLIMIT_DATA, &data));
+    }
+#endif
+}
+
+} // namespace
+
+void guard_process() noexcept {
+    static char program_name[] = "vorl_initialiser";
+    program_invocation_short_name = program_name;
+    std::signal(SIGPIPE, SIG_IGN);
+    std::signal(SIGXFSZ, SIG_IGN);
+    occupy_standard_descriptors();
+    // A line reaches the log whole: some logs make a record of each write.
+    static_cast<void>(std::setvbuf(stderr, nullptr, _IOLBF, 0));
+    bound_memory();
+}
+
+} // namespace initialiser
