@@ -3,7 +3,6 @@
 #include "foundation/paths.h"
 
 #include <fcntl.h>
-#include <gtest/gtest.h>
 #include <sched.h>
 #include <sys/mman.h>
 #include <sys/mount.h>
@@ -11,9 +10,7 @@
 #include <sys/wait.h>
 #include <unistd.h>
 
-#include <algorithm>
 #include <cerrno>
-#include <cstring>
 #include <filesystem>
 #include <fstream>
 #include <sstream>
@@ -31,20 +28,20 @@ void must(bool done, const std::string& what) {
 }
 
 void write_file(const fs::path& path, const std::string& text) {
-    std::ofstream file{path, std::ios::binary};
+    std::ofstream file{path};
     file << text;
     must(file.flush().good(), path);
 }
 
 std::string read_file(const fs::path& path) {
     std::ostringstream text;
-    text << std::ifstream{path, std::ios::binary}.rdbuf();
+    text << std::ifstream{path}.rdbuf();
     return text.str();
 }
 
 // Root makes a mount namespace; anybody else needs a user namespace around it, where the kernel
 // allows that.
-void enter_namespace() {
+bool enter_namespace() {
     const std::string user = std::to_string(geteuid());
     const std::string group = std::to_string(getegid());
     if (unshare(CLONE_NEWNS) != 0) {
@@ -54,6 +51,7 @@ void enter_namespace() {
         write_file("/proc/self/gid_map", "0 " + group + " 1");
     }
     must(mount(nullptr, "/", nullptr, MS_REC | MS_PRIVATE, nullptr) == 0, "no private mounts");
+    return true;
 }
 
 // Opened before the first device hides the place where it may have been built.
@@ -67,18 +65,14 @@ fs::path full(const std::string& path) {
 }
 
 std::string description(const fs::path& path) {
-    switch (fs::symlink_status(path).type()) {
-    case fs::file_type::symlink:
+    const fs::file_status status = fs::symlink_status(path);
+    if (fs::is_symlink(status)) {
         return "-> " + fs::read_symlink(path).string();
-    case fs::file_type::regular:
-        return fs::is_empty(path) ? "=" : "= " + read_file(path);
-    case fs::file_type::directory:
-        return "folder";
-    case fs::file_type::fifo:
-        return "fifo";
-    default:
-        return "something else";
     }
+    if (fs::is_regular_file(status)) {
+        return fs::is_empty(path) ? "=" : "= " + read_file(path);
+    }
+    return fs::is_directory(status) ? "folder" : "fifo";
 }
 
 void put_one(const std::string& path, const std::string& what) {
@@ -97,11 +91,11 @@ void put_one(const std::string& path, const std::string& what) {
         must(mkfifo(place.c_str(), 0644) == 0, path);
     } else if (what.starts_with("-> ")) {
         fs::create_symlink(what.substr(3), place);
-    } else if (what == "private") {
-        write_file(place, "");
-        fs::permissions(place, fs::perms::owner_read);
+    } else if (what.starts_with("= ")) {
+        write_file(place, what.substr(2));
     } else if (what != "nothing") {
-        write_file(place, what.substr(std::min(what.size(), std::size_t{2})));
+        write_file(place, "");
+        fs::permissions(place, fs::perms{what == "private" ? 0600U : 0644U});
     }
 }
 
@@ -115,30 +109,11 @@ tree survey(std::string (*describe)(const fs::path&)) {
     return all;
 }
 
-bool is_error_text(const std::string& text) {
-    constexpr int last_error = 133;
-    for (int error = 0; error <= last_error; ++error) {
-        if (text == strerror(error)) {
-            return true;
-        }
-    }
-    return false;
-}
-
 } // namespace
 
-tree after(tree contents, const changes& list) {
-    for (const auto& [path, what] : list) {
-        contents[full(path)] = what;
-    }
-    std::erase_if(contents, [](const auto& entry) { return entry.second == "nothing"; });
-    return contents;
-}
-
 device::device() {
-    static_cast<void>(program());
-    static const bool entered = (enter_namespace(), true);
-    static_cast<void>(entered);
+    static const bool entered = program() >= 0 && enter_namespace();
+    must(entered, "no program");
     must(mount("device", "/usr/share", "tmpfs", 0, "mode=755") == 0, "no private /usr/share");
     must(mount("device", "/var", "tmpfs", 0, "mode=755") == 0, "no private /var");
     put({{"/usr/share/zoneinfo.default/+VERSION", "= 2019c\n"},
@@ -171,10 +146,8 @@ tree device::stamps() {
     return survey([](const fs::path& path) {
         struct stat status {};
         must(lstat(path.c_str(), &status) == 0, path);
-        std::ostringstream stamp;
-        stamp << status.st_ino << ' ' << status.st_mode << ' ' << status.st_ctim.tv_sec << '.'
-              << status.st_ctim.tv_nsec;
-        return stamp.str();
+        return std::to_string(status.st_ino) + " " + std::to_string(status.st_ctim.tv_sec) + "." +
+               std::to_string(status.st_ctim.tv_nsec);
     });
 }
 
@@ -196,26 +169,31 @@ outcome device::start_up(const std::function<void()>& prepare,
     must(waitpid(child, &status, 0) == child, "the program is lost");
     const std::string printed = read_file("/proc/self/fd/" + std::to_string(log));
     close(log);
-    return {WIFSIGNALED(status) ? 128 + WTERMSIG(status) : WEXITSTATUS(status), lines_of(printed)};
+    return {WIFSIGNALED(status) ? 128 + WTERMSIG(status) : WEXITSTATUS(status), printed};
 }
 
-messages lines_of(const std::string& printed, const std::string& program) {
+tree after(tree contents, const changes& list) {
+    for (const auto& [path, what] : list) {
+        contents[full(path)] = what;
+    }
+    std::erase_if(contents, [](const auto& entry) { return entry.second == "nothing"; });
+    return contents;
+}
+
+messages lines_of(const std::string& printed, const messages& expected,
+                  const std::string& program) {
     messages lines;
     std::istringstream stream{printed};
-    for (std::string line; std::getline(stream, line);) {
-        const std::string start = program + ": ";
-        const auto end = line.rfind(": ");
-        const bool complete = line.starts_with(start) && end >= start.size() - 2 &&
-                              is_error_text(line.substr(end + 2));
-        lines.push_back(complete ? line.substr(start.size(), end - start.size()) : line);
+    for (std::string line; std::getline(stream, line); lines.push_back(line)) {
+        if (line.starts_with(program + ": ")) {
+            line.erase(0, program.size() + 2);
+        }
+        const std::string wanted = lines.size() < expected.size() ? expected[lines.size()] : "";
+        if (line.starts_with(wanted + ": ") && line.rfind(": ") == wanted.size()) {
+            line = wanted;
+        }
     }
     return lines;
-}
-
-messages printed_by(const std::function<void()>& action) {
-    testing::internal::CaptureStderr();
-    action();
-    return lines_of(testing::internal::GetCapturedStderr(), program_invocation_short_name);
 }
 
 } // namespace initialiser

@@ -1,0 +1,138 @@
+#include "dataset/dataset.h"
+#include "dataset/icu.h"
+#include "dataset/zoneinfo.h"
+#include "device.h"
+#include "foundation/expression.h"
+#include "foundation/file_system.h"
+#include "startup/current_links.h"
+
+#include <gtest/gtest.h>
+
+#include <cerrno>
+#include <regex>
+#include <stdexcept>
+#include <type_traits>
+
+// What a whole start-up can't show.
+namespace initialiser {
+namespace {
+
+// Deletion through the interface must not compile.
+static_assert(!std::is_destructible_v<vorl_dataset_component>);
+
+void expect_printed(const messages& expected, const std::function<void()>& action) {
+    testing::internal::CaptureStderr();
+    action();
+    EXPECT_EQ(
+        lines_of(testing::internal::GetCapturedStderr(), expected, program_invocation_short_name),
+        expected);
+}
+
+int number_thrown_by(const std::function<void()>& action) {
+    try {
+        action();
+    } catch (const int number) {
+        return number;
+    }
+    return 0;
+}
+
+std::string shown(const vorl_version& version) {
+    return std::to_string(version.year) + " " + version.letters + " " +
+           std::to_string(version.major) + " " + std::to_string(version.minor);
+}
+
+TEST(version, parses_whole_texts_only) {
+    for (const auto& [text, parsed] : tree{{"2019c", "2019 c -1 -1"},
+                                           {"2020a.1.0", "2020 a 1 0"},
+                                           {"2019c.1", "2019 c 1 -1"},
+                                           {"2016j.12.345", "2016 j 12 345"},
+                                           {"02019ab.007", "2019 ab 7 -1"},
+                                           {"1c.2147483647", "1 c 2147483647 -1"}}) {
+        expect_printed(
+            {}, [&parsed = parsed, &text = text] { EXPECT_EQ(shown(vorl_version{text}), parsed); });
+    }
+    for (const std::string text : {"2019C", "2019", "2019c.", "2019c.1.0.2", "", "v2019c", " 2019c",
+                                   "2019c ", "2019c.1.0/", "2019\xe4"}) {
+        const std::string line = "Cannot parse version string " + text;
+        vorl_version version{"1a.2.3"};
+        expect_printed({line + ", results.size() = 0", line}, [&] { version.parse(text); });
+        EXPECT_TRUE(version.equals(vorl_version{}));
+    }
+    for (const std::string text : {"2147483648c", "2019c.2147483648.4", "2019c.1.99999999999"}) {
+        expect_printed({}, [&] { EXPECT_THROW(vorl_version{text}, std::out_of_range); });
+    }
+}
+
+TEST(version, is_strictly_and_totally_ordered) {
+    std::vector<vorl_version> ascending(1);
+    for (const std::string text : {"2019aa", "2019b", "2019c", "2019c.0", "2019c.1", "2019c.1.0",
+                                   "2019c.2", "2019c.10.0", "2019ca", "2019d", "2020a"}) {
+        ascending.emplace_back(text);
+    }
+    // Every pair stands as in the table, and so every triple too.
+    for (std::size_t first = 0; first < ascending.size(); ++first) {
+        for (std::size_t second = 0; second < ascending.size(); ++second) {
+            SCOPED_TRACE(shown(ascending[first]) + " and " + shown(ascending[second]));
+            EXPECT_EQ(ascending[first].newer_than(ascending[second]), first > second);
+            EXPECT_EQ(ascending[first].equals(ascending[second]), first == second);
+        }
+    }
+}
+
+TEST(expression, matches_long_texts_and_knows_no_classes) {
+    constexpr std::size_t length = 200'000;
+    const vorl_expression expression{"([0-9]+)([a-z]+)"};
+    EXPECT_EQ(expression.match_whole("1" + std::string(length, 'a'))[2].size(), length);
+    EXPECT_TRUE(expression.match_whole(std::string(length, '1')).empty());
+    EXPECT_THROW(vorl_expression{R"(\d+)"}, std::regex_error);
+}
+
+TEST(file_system, throws_error_numbers) {
+    const device device;
+    const std::string tz = "/var/db/timezone/tz";
+    testing::internal::CaptureStderr();
+    EXPECT_EQ(number_thrown_by([&] { remove(tz); }), EISDIR);
+    EXPECT_EQ(number_thrown_by([&] { read_symlink(tz); }), EINVAL);
+    EXPECT_EQ(number_thrown_by([&] { create_symlink("target", tz); }), EEXIST);
+    EXPECT_EQ(number_thrown_by([&] { create_symlink("target", tz + "/none/link"); }), ENOENT);
+    EXPECT_EQ(number_thrown_by([&] { remove(tz + "/none"), read_symlink(tz + "/none"); }), 0);
+    testing::internal::GetCapturedStderr();
+}
+
+TEST(current_links, map_to_dataset_paths) {
+    const std::string stored = "/var/db/timezone/tz/";
+    for (const auto& [target, path] : tree{{"/usr/share/zoneinfo.default", ""},
+                                           {stored + "2019c.1.0/zoneinfo", stored + "2019c.1.0"},
+                                           {stored + "2019c.1.0/", stored + "2019c.1.0"},
+                                           {stored + "a/b/zoneinfo", stored + "a/b"},
+                                           {stored + "x/", stored + "x"}}) {
+        EXPECT_EQ(dataset_path_of_zoneinfo_link(target), path);
+    }
+    for (const std::string target :
+         {"/var/db/timezone/tz/2019c.1.0", "/var/db/timezone/tz//zoneinfo", "/var/db/timezone/tz/",
+          "", "/usr/share/zoneinfo", "/usr/share/zoneinfo.default/", "tz/2019c/zoneinfo"}) {
+        expect_printed({"Bad zoneinfo link " + target}, [&] {
+            EXPECT_EQ(number_thrown_by([&] { dataset_path_of_zoneinfo_link(target); }), -1);
+        });
+    }
+}
+
+TEST(components, are_compatible_by_kind) {
+    const device device;
+    EXPECT_TRUE(vorl_zoneinfo{}.compatible_schema(vorl_icu{}));
+    expect_printed({"vorl_icu::compatible_schema: could not dynamic_cast other component"},
+                   [] { EXPECT_FALSE(vorl_icu{}.compatible_schema(vorl_zoneinfo{})); });
+}
+
+TEST(datasets, refuse_bad_paths) {
+    for (const std::string path :
+         {"/var/db/timezone/tz/", "/var/db/timezone/tz2/2019c.1.0", "/var/db/timezone/TZ/2019c.1.0",
+          "var/db/timezone/tz/2019c.1.0", "/usr/share/zoneinfo.default", "x"}) {
+        expect_printed({"vorl_dataset::create_components: bad path " + path},
+                       [&] { EXPECT_THROW(vorl_dataset{path}, std::invalid_argument); });
+    }
+}
+
+} // namespace
+} // namespace initialiser
