@@ -5,6 +5,7 @@
 #include <unistd.h>
 
 #include <algorithm>
+#include <array>
 #include <cerrno>
 #include <csignal>
 #include <cstdio>
@@ -47,7 +48,8 @@ void guard_process() noexcept {
     std::signal(SIGXFSZ, SIG_IGN);
     occupy_standard_descriptors();
     // A line reaches the log whole: some logs make a record of each write.
-    static_cast<void>(std::setvbuf(stderr, nullptr, _IOLBF, 0));
+    static std::array<char, BUFSIZ> line{};
+    static_cast<void>(std::setvbuf(stderr, line.data(), _IOLBF, line.size()));
     bound_memory();
 }
 
