@@ -50,7 +50,12 @@ bool enter_namespace() {
         write_file("/proc/self/uid_map", "0 " + user + " 1");
         write_file("/proc/self/gid_map", "0 " + group + " 1");
     }
+    // In a chroot "/" is no mount: step out to the namespace's own root, and back in again.
+    const int root = open("/", O_PATH | O_CLOEXEC);
+    const int mounts = open("/proc/self/ns/mnt", O_RDONLY | O_CLOEXEC);
+    must(setns(mounts, CLONE_NEWNS) == 0, "no way to the root of the mounts");
     must(mount(nullptr, "/", nullptr, MS_REC | MS_PRIVATE, nullptr) == 0, "no private mounts");
+    must(fchdir(root) == 0 && chroot(".") == 0, "no way back");
     return true;
 }
 
