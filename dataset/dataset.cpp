@@ -8,6 +8,7 @@
 
 #include <algorithm>
 #include <stdexcept>
+#include <utility>
 
 namespace initialiser {
 namespace {
@@ -23,7 +24,7 @@ bool is_among_stored_datasets(const std::string& path) {
 
 vorl_dataset::vorl_dataset() : vorl_dataset(std::string{}) {}
 
-vorl_dataset::vorl_dataset(const std::string& folder) : path(folder) {
+vorl_dataset::vorl_dataset(std::string folder) : path(std::move(folder)) {
     create_components();
 }
 

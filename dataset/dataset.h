@@ -19,7 +19,7 @@ public:
     // nor a folder among the stored data sets; passes on what building the version and the
     // components prints and throws.
     vorl_dataset();
-    explicit vorl_dataset(const std::string& folder);
+    explicit vorl_dataset(std::string folder);
     vorl_dataset(const vorl_dataset&) = delete;
     vorl_dataset& operator=(const vorl_dataset&) = delete;
 
