@@ -1,0 +1,2 @@
+// What every static program costs.
+int main() {}
