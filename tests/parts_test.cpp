@@ -1,10 +1,9 @@
-#include "dataset/dataset.h"
 #include "dataset/icu.h"
 #include "dataset/zoneinfo.h"
 #include "device.h"
 #include "foundation/expression.h"
 #include "foundation/file_system.h"
-#include "startup/current_links.h"
+#include "foundation/version.h"
 
 #include <gtest/gtest.h>
 
@@ -100,38 +99,11 @@ TEST(file_system, throws_error_numbers) {
     testing::internal::GetCapturedStderr();
 }
 
-TEST(current_links, map_to_dataset_paths) {
-    const std::string stored = "/var/db/timezone/tz/";
-    for (const auto& [target, path] : tree{{"/usr/share/zoneinfo.default", ""},
-                                           {stored + "2019c.1.0/zoneinfo", stored + "2019c.1.0"},
-                                           {stored + "2019c.1.0/", stored + "2019c.1.0"},
-                                           {stored + "a/b/zoneinfo", stored + "a/b"},
-                                           {stored + "x/", stored + "x"}}) {
-        EXPECT_EQ(dataset_path_of_zoneinfo_link(target), path);
-    }
-    for (const std::string target :
-         {"/var/db/timezone/tz/2019c.1.0", "/var/db/timezone/tz//zoneinfo", "/var/db/timezone/tz/",
-          "", "/usr/share/zoneinfo", "/usr/share/zoneinfo.default/", "tz/2019c/zoneinfo"}) {
-        expect_printed({"Bad zoneinfo link " + target}, [&] {
-            EXPECT_EQ(number_thrown_by([&] { dataset_path_of_zoneinfo_link(target); }), -1);
-        });
-    }
-}
-
 TEST(components, are_compatible_by_kind) {
     const device device;
     EXPECT_TRUE(vorl_zoneinfo{}.compatible_schema(vorl_icu{}));
     expect_printed({"vorl_icu::compatible_schema: could not dynamic_cast other component"},
                    [] { EXPECT_FALSE(vorl_icu{}.compatible_schema(vorl_zoneinfo{})); });
-}
-
-TEST(datasets, refuse_bad_paths) {
-    for (const std::string path :
-         {"/var/db/timezone/tz/", "/var/db/timezone/tz2/2019c.1.0", "/var/db/timezone/TZ/2019c.1.0",
-          "var/db/timezone/tz/2019c.1.0", "/usr/share/zoneinfo.default", "x"}) {
-        expect_printed({"vorl_dataset::create_components: bad path " + path},
-                       [&] { EXPECT_THROW(vorl_dataset{path}, std::invalid_argument); });
-    }
 }
 
 } // namespace
