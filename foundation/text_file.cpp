@@ -41,6 +41,9 @@ std::string read_first_word(const std::string& path) {
     }
     // O_NONBLOCK: some kernel files pass for regular ones and wait for their next line.
     const vorl_descriptor file{::open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK | O_NOCTTY)};
+    if (!file.is_open()) {
+        return {};
+    }
     std::string word;
     std::array<char, block_size> block{};
     while (true) {

@@ -12,7 +12,7 @@ namespace initialiser {
 std::string read_first_word(const std::string& path);
 
 // Makes `text` the whole content of the regular file at `path`, creating it with mode 0666 less the
-// mask. Where anything else stands, a link included, or on any failure: nothing is said.
+// mask. Where anything else stands, a link included, nothing is written; no failure is told.
 void write_text(const std::string& path, const std::string& text);
 
 } // namespace initialiser
