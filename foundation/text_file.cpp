@@ -33,6 +33,20 @@ bool is_free_or_regular_file(const std::string& path) {
     return S_ISREG(status.st_mode);
 }
 
+// Adds to `word` what `block` holds of it. True when white space has ended it.
+bool extend_word(std::string& word, std::string_view block) {
+    for (const char byte : block) {
+        const bool blank = white_space.find(byte) != std::string_view::npos;
+        if (blank && !word.empty()) {
+            return true;
+        }
+        if (!blank) {
+            word += byte;
+        }
+    }
+    return false;
+}
+
 } // namespace
 
 std::string read_first_word(const std::string& path) {
@@ -51,17 +65,9 @@ std::string read_first_word(const std::string& path) {
         if (length < 0) {
             return {};
         }
-        if (length == 0) {
+        const std::string_view read{block.data(), static_cast<std::size_t>(length)};
+        if (read.empty() || extend_word(word, read)) {
             return word;
-        }
-        for (const char byte : std::string_view{block.data(), static_cast<std::size_t>(length)}) {
-            const bool blank = white_space.find(byte) != std::string_view::npos;
-            if (blank && !word.empty()) {
-                return word;
-            }
-            if (!blank) {
-                word += byte;
-            }
         }
     }
 }
