@@ -3,8 +3,8 @@
 namespace initialiser {
 
 // Makes the process independent of how it was started, before anything is opened or printed:
-// - messages carry the program's own name, one line is one write, and none can end the process or
-//   land in a file that was opened under the number of a closed standard error;
+// - messages carry the program's own name, a line of usual length is one write, and none can end
+//   the process or land in a file opened under the number of a closed standard error;
 // - a file-size limit fails a write instead of ending the process;
 // - memory has a bound, so that an endless file is a failure like any other.
 // What can't be set stays as it was.
