@@ -5,7 +5,7 @@
 
 namespace initialiser {
 
-// One kind of time-zone data in a data set. It knows the data set's folder, whether its data fit
+// One kind of time-zone data in a data set. It knows the data set's directory, whether its data fit
 // the installed system, and how to point the system's links for its kind of data at itself.
 class vorl_dataset_component {
 public:
@@ -14,8 +14,8 @@ public:
     virtual bool compatible_schema(const vorl_dataset_component& other) const = 0;
 
     // Removes the old links for this kind of data, then makes the new one where the kind has one.
-    // A failed removal is printed and passed over; a failed creation throws its error number and
-    // leaves on disk what was done so far.
+    // A failed removal is printed and passed over. A failed creation throws its error number; what
+    // was done before it stays done.
     virtual void install_links() const = 0;
 
     vorl_dataset_component(const vorl_dataset_component&) = delete;
@@ -23,14 +23,14 @@ public:
 
 protected:
     vorl_dataset_component() = default;
-    explicit vorl_dataset_component(std::string path) : dataset_path(std::move(path)) {}
+    explicit vorl_dataset_component(std::string path) : dataset_path_(std::move(path)) {}
 
-    // Not virtual, and out of reach: a component is destroyed as its own kind, by the shared
-    // pointer that was made for that kind.
+    // Neither virtual nor public: the shared pointer that was made for a component's own kind
+    // destroys it as that kind.
     ~vorl_dataset_component() = default;
 
-    // The data set's folder, as it was given; empty for the system data set.
-    const std::string dataset_path;
+    // The data set's directory, as it was given; empty for the system data set.
+    const std::string dataset_path_;
 };
 
 } // namespace initialiser

@@ -13,7 +13,7 @@
 namespace initialiser {
 namespace {
 
-// The system's tz database names its tz release only; its data count as that release's first.
+// The system's tz database names its tz release only. Its data count as the first of that release.
 constexpr auto system_version_suffix = ".1.0";
 
 bool is_among_stored_datasets(const std::string& path) {
@@ -24,41 +24,41 @@ bool is_among_stored_datasets(const std::string& path) {
 
 vorl_dataset::vorl_dataset() : vorl_dataset(std::string{}) {}
 
-vorl_dataset::vorl_dataset(std::string folder) : path(std::move(folder)) {
+vorl_dataset::vorl_dataset(std::string path) : path_(std::move(path)) {
     create_components();
 }
 
 void vorl_dataset::create_components() {
-    const auto zoneinfo = std::make_shared<vorl_zoneinfo>(path);
-    if (path.empty()) {
+    const auto zoneinfo = std::make_shared<vorl_zoneinfo>(path_);
+    if (path_.empty()) {
         version_text_ = zoneinfo->version_text() + system_version_suffix;
-    } else if (is_among_stored_datasets(path)) {
-        version_text_ = path.substr(stored_datasets.size());
+    } else if (is_among_stored_datasets(path_)) {
+        version_text_ = path_.substr(stored_datasets.size());
     } else {
-        warn("vorl_dataset::create_components: bad path %s", path.c_str());
+        warn("vorl_dataset::create_components: bad path %s", path_.c_str());
         throw std::invalid_argument("badpath");
     }
-    version.parse(version_text_);
-    components.push_back(zoneinfo);
-    components.push_back(std::make_shared<vorl_icu>(path));
+    version_.parse(version_text_);
+    components_.push_back(zoneinfo);
+    components_.push_back(std::make_shared<vorl_icu>(path_));
 }
 
 bool vorl_dataset::compatible_with(const vorl_dataset& other) const {
     return std::equal(
-        components.begin(), components.end(), other.components.begin(), other.components.end(),
+        components_.begin(), components_.end(), other.components_.begin(), other.components_.end(),
         [](const auto& own, const auto& others) { return own->compatible_schema(*others); });
 }
 
 bool vorl_dataset::newer_than(const vorl_dataset& other) const {
-    return version.newer_than(other.version);
+    return version_.newer_than(other.version_);
 }
 
 bool vorl_dataset::same_path(const vorl_dataset& other) const {
-    return path == other.path;
+    return path_ == other.path_;
 }
 
 void vorl_dataset::activate() const {
-    for (const auto& component : components) {
+    for (const auto& component : components_) {
         component->install_links();
     }
 }

@@ -10,16 +10,16 @@
 namespace initialiser {
 
 // One complete set of time-zone data: where it lies, its version, and its two components. The empty
-// path is the system data set; any other is a stored data set's folder, named by its version text.
-// A data set is complete when it is built and never changes; it is never copied.
+// path is the system data set. Any other is a stored data set's directory, named by its version
+// text. A data set is complete when it is built, never changes and is never copied.
 class vorl_dataset {
 public:
-    // Builds the system data set, or the one in `folder`. Prints "vorl_dataset::create_components:
-    // bad path PATH" and throws std::invalid_argument ("badpath") when the path is neither empty
-    // nor a folder among the stored data sets; passes on what building the version and the
-    // components prints and throws.
+    // Builds the system data set, or the one at `path`. For a path that is neither empty nor below
+    // the directory of the stored data sets, prints "vorl_dataset::create_components: bad path
+    // PATH" and throws std::invalid_argument ("badpath"). Prints and throws what building the
+    // version and the components does.
     vorl_dataset();
-    explicit vorl_dataset(std::string folder);
+    explicit vorl_dataset(std::string path);
     vorl_dataset(const vorl_dataset&) = delete;
     vorl_dataset& operator=(const vorl_dataset&) = delete;
 
@@ -28,11 +28,11 @@ public:
     bool newer_than(const vorl_dataset& other) const;
     bool same_path(const vorl_dataset& other) const;
 
-    // Points the system's links at this data set: the zoneinfo link, then the ICU link. The first
-    // link that can't be made ends it with a thrown error number; what was done before stays done.
+    // Points the system's links at this data set: the zoneinfo link, then the ICU link. Throws the
+    // error number of the first link that can't be made; what was done before it stays done.
     void activate() const;
 
-    // The version as text, for messages and records: a stored data set's folder name, or the
+    // The version as text, for messages and the record: a stored data set's directory name, or the
     // system's tz release followed by ".1.0".
     std::string version_text() const { return version_text_; }
 
@@ -42,10 +42,10 @@ public:
 private:
     void create_components();
 
-    vorl_version version;
+    vorl_version version_;
     std::string version_text_;
-    std::string path;
-    std::vector<std::shared_ptr<vorl_dataset_component>> components;
+    std::string path_;
+    std::vector<std::shared_ptr<vorl_dataset_component>> components_;
 };
 
 } // namespace initialiser

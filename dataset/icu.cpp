@@ -1,8 +1,8 @@
 #include "dataset/icu.h"
 
+#include "foundation/directory_walk.h"
 #include "foundation/expression.h"
 #include "foundation/file_system.h"
-#include "foundation/folder_walk.h"
 #include "foundation/paths.h"
 #include "foundation/text_file.h"
 
@@ -15,7 +15,8 @@
 namespace initialiser {
 namespace {
 
-// Names that carry a schema: digits, then l, b or e, the byte order and character set of the files.
+// Names that tell the schema: digits, then the byte order and character set of the files: l, b or
+// e.
 constexpr auto icu_file_expression = R"(icutz([0-9]+[lbe])\.dat)";
 
 } // namespace
@@ -23,33 +24,35 @@ constexpr auto icu_file_expression = R"(icutz([0-9]+[lbe])\.dat)";
 vorl_icu::vorl_icu() : vorl_icu(std::string{}) {}
 
 vorl_icu::vorl_icu(const std::string& path)
-    : vorl_dataset_component(path), icu_path(path.empty() ? system_icu : path + "/" + icu_folder) {
+    : vorl_dataset_component(path),
+      icu_path_(path.empty() ? system_icu : path + "/" + icu_directory) {
     initialize();
 }
 
 void vorl_icu::initialize() {
-    if (dataset_path.empty()) {
-        schema = read_first_word(icu_path + "/" + schema_file);
+    if (dataset_path_.empty()) {
+        schema_ = read_first_word(icu_path_ + "/" + schema_file);
         return;
     }
     find_schema_of_files();
-    if (schema.empty()) {
-        warn("No ICU schema found for %s", dataset_path.c_str());
+    if (schema_.empty()) {
+        warn("No ICU schema found for %s", dataset_path_.c_str());
     }
 }
 
 void vorl_icu::find_schema_of_files() {
     const vorl_expression expression{icu_file_expression};
-    vorl_folder_walk walk{icu_path};
-    if (!walk.is_open()) {
+    vorl_directory_walk walk{icu_path_};
+    if (walk.out_of_memory()) {
         const int error = errno;
-        warn("tz_icu::initialize: fts_open of %s failed, %s", icu_path.c_str(), strerror(error));
+        // Other programs look for this text: its names stay as they are.
+        warn("tz_icu::initialize: fts_open of %s failed, %s", icu_path_.c_str(), strerror(error));
         throw error;
     }
     while (const char* const name = walk.next()) {
         const std::vector<std::string> groups = expression.match_whole(name);
         if (!groups.empty() && walk.is_public_file(name)) {
-            schema = groups[1];
+            schema_ = groups[1];
             return;
         }
     }
@@ -61,7 +64,7 @@ bool vorl_icu::compatible_schema(const vorl_dataset_component& other) const {
         warn("vorl_icu::compatible_schema: could not dynamic_cast other component");
         return false;
     }
-    return schema == other_icu->schema;
+    return schema_ == other_icu->schema_;
 }
 
 void vorl_icu::install_links() const {
@@ -69,10 +72,12 @@ void vorl_icu::install_links() const {
         remove(icu_link);
         remove(legacy_icu_link);
     } catch (...) {
+        // In lower case, unlike its fellow for the zoneinfo link: other programs look for this
+        // text.
         warn("unlink of ICU softlink failed");
     }
-    if (!dataset_path.empty()) {
-        create_symlink(icu_path, icu_link);
+    if (!dataset_path_.empty()) {
+        create_symlink(icu_path_, icu_link);
     }
 }
 

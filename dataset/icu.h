@@ -6,33 +6,33 @@
 
 namespace initialiser {
 
-// A data set's ICU time-zone resource files. Their schema, such as 44l, decides whether a stored
-// data set can be used with the installed system.
+// A data set's ICU time-zone files. Their schema, such as 44l, decides whether a stored data set
+// can be used with the installed system.
 class vorl_icu final : public vorl_dataset_component {
 public:
-    // Finds the schema of the files of the data set at `path`, or of the system data set. None is
-    // no error: the schema is then empty, and for a stored data set "No ICU schema found for PATH"
-    // is printed. When the folder can't be walked for want of memory, prints "tz_icu::initialize:
-    // fts_open of FOLDER failed, REASON" and throws the error number.
+    // Finds the schema of the ICU files of the data set at `path`, or without a path of the system.
+    // None is no error: the schema is then empty, and for a stored data set "No ICU schema found
+    // for PATH" is printed. Without memory to walk the directory, prints "tz_icu::initialize:
+    // fts_open of DIRECTORY failed, REASON" and throws the error number.
     vorl_icu();
     explicit vorl_icu(const std::string& path);
 
-    // True when both schemas are the same text, two empty ones included. Against a component of
-    // another kind prints "vorl_icu::compatible_schema: could not dynamic_cast other component" and
-    // is false.
+    // True when both schemas are the same text; two empty ones are. For a component of another
+    // kind, prints "vorl_icu::compatible_schema: could not dynamic_cast other component" and
+    // returns false.
     bool compatible_schema(const vorl_dataset_component& other) const override;
 
-    // Removes the ICU link and the legacy one; points the ICU link at the files of a stored data
-    // set. The system data set has no ICU link. Prints "unlink of ICU softlink failed" when a link
-    // stays.
+    // Removes the ICU link and the legacy one. For a stored data set, points the ICU link at its
+    // files; the system data set has no ICU link. Prints "unlink of ICU softlink failed" when a
+    // link can't be removed.
     void install_links() const override;
 
 private:
     void initialize();
     void find_schema_of_files();
 
-    std::string schema;
-    std::string icu_path;
+    std::string schema_;
+    std::string icu_path_;
 };
 
 } // namespace initialiser

@@ -12,12 +12,12 @@ vorl_zoneinfo::vorl_zoneinfo() : vorl_zoneinfo(std::string{}) {}
 
 vorl_zoneinfo::vorl_zoneinfo(const std::string& path)
     : vorl_dataset_component(path),
-      zoneinfo_path(path.empty() ? system_zoneinfo : path + "/" + zoneinfo_folder) {
+      zoneinfo_path_(path.empty() ? system_zoneinfo : path + "/" + zoneinfo_directory) {
     read_version();
 }
 
 void vorl_zoneinfo::read_version() {
-    version_text_ = read_first_word(zoneinfo_path + "/" + version_file);
+    version_text_ = read_first_word(zoneinfo_path_ + "/" + version_file);
 }
 
 bool vorl_zoneinfo::compatible_schema(const vorl_dataset_component& /*other*/) const {
@@ -30,7 +30,7 @@ void vorl_zoneinfo::install_links() const {
     } catch (...) {
         warn("Unlink of zoneinfo softlink failed");
     }
-    create_symlink(zoneinfo_path, zoneinfo_link);
+    create_symlink(zoneinfo_path_, zoneinfo_link);
 }
 
 } // namespace initialiser

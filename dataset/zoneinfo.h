@@ -6,10 +6,10 @@
 
 namespace initialiser {
 
-// A data set's compiled tz database: a folder of zone files with a "+VERSION" file at its top.
+// A data set's compiled tz database: a directory of zone files with a "+VERSION" file at its top.
 class vorl_zoneinfo final : public vorl_dataset_component {
 public:
-    // Finds the database of the data set at `path`, or of the system data set, and reads its
+    // Finds the database of the data set at `path`, or without a path the system's, and reads its
     // version. A missing or unreadable database is no error.
     vorl_zoneinfo();
     explicit vorl_zoneinfo(const std::string& path);
@@ -17,8 +17,8 @@ public:
     // Always true: compiled zone files have one format.
     bool compatible_schema(const vorl_dataset_component& other) const override;
 
-    // Points the zoneinfo link at the database, whether or not it exists. Prints "Unlink of
-    // zoneinfo softlink failed" when the old link stays.
+    // Points the zoneinfo link at the database, which need not exist. Prints "Unlink of zoneinfo
+    // softlink failed" when the old link can't be removed.
     void install_links() const override;
 
     // The first word of the "+VERSION" file, a tz release such as 2019c; empty when there is none.
@@ -27,7 +27,7 @@ public:
 private:
     void read_version();
 
-    std::string zoneinfo_path;
+    std::string zoneinfo_path_;
     std::string version_text_;
 };
 

@@ -1,29 +1,38 @@
 #pragma once
 
+#include <fcntl.h>
 #include <sys/types.h>
 
+#include <cerrno>
 #include <string>
 
-// Data-protection classes say when the keys to a file are at hand. Linux has none, so this layer
-// takes the calls' arguments, does what is left of them without classes, and claims no more.
+// Data-protection classes say when the keys to a file are at hand. Linux has none. These are
+// stand-ins for the platform's calls: they take the same arguments and do the part that needs no
+// classes.
 namespace initialiser {
 
-// Class 4: readable at all times, before the first unlock too. Whatever is needed at start-up has
-// to be of this class.
+// Class 4: readable at all times, before the first unlock too, as everything needed at start-up is.
 inline constexpr int always_readable = 4;
 
-// The file-control command that sets the class of an open folder.
+// The file-control command that sets the class of an open directory.
 inline constexpr int set_class_command = 64;
 
-// Applies a data-protection command to an open folder. Here: changes nothing, returns -1 and sets
-// the error number to ENOTSUP. The command is kept from the kernel, where its number may one day
-// mean something else.
-int control_protection(int descriptor, int command, int protection_class) noexcept;
+// Applies a data-protection command to an open directory. Here it changes nothing, returns -1 and
+// sets the error number to ENOTSUP. The kernel is not asked: to it, the command's number may one
+// day mean something else.
+inline int control_protection(int /*descriptor*/, int /*command*/,
+                              int /*protection_class*/) noexcept {
+    errno = ENOTSUP;
+    return -1;
+}
 
-// Opens `path`, creating it in a protection class when the flags say so. Returns the descriptor, or
-// -1 with the error number set. Here: an ordinary open without a class, that neither follows a link
-// at `path` (a file must not appear where a planted link points) nor waits (for a FIFO's reader).
-int open_protected(const std::string& path, int flags, int protection_class, int option_flags,
-                   mode_t mode) noexcept;
+// Opens `path`, and creates it in a protection class when the flags say so. Returns the descriptor,
+// or -1 with the error number set. Here it is an ordinary open without a class. It does not follow
+// a link at `path`, since a planted link could make a file anywhere, and does not wait for a FIFO's
+// reader.
+inline int open_protected(const std::string& path, int flags, int /*protection_class*/,
+                          int /*option_flags*/, mode_t mode) noexcept {
+    return ::open(path.c_str(), flags | O_NOFOLLOW | O_NONBLOCK | O_NOCTTY | O_CLOEXEC, mode);
+}
 
 } // namespace initialiser

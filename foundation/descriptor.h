@@ -1,8 +1,13 @@
 #pragma once
 
+#include <unistd.h>
+
+#include <utility>
+
 namespace initialiser {
 
-// Owns an open descriptor and closes it at the end of its scope. Negative: nothing is open.
+// Owns an open descriptor and closes it at the end of its scope. A negative number is that of a
+// failed open: nothing is open then.
 class vorl_descriptor {
 public:
     explicit vorl_descriptor(int number) noexcept : number_(number) {}
@@ -13,9 +18,11 @@ public:
     bool is_open() const noexcept { return number_ >= 0; }
     int number() const noexcept { return number_; }
 
-    // Closes now; true when the close succeeded or nothing was open. The descriptor is gone in
-    // either case.
-    bool close() noexcept;
+    // Closes it now. False when the close fails; the descriptor is gone all the same.
+    bool close() noexcept {
+        const int closing = std::exchange(number_, -1);
+        return closing < 0 || ::close(closing) == 0;
+    }
 
 private:
     int number_;

@@ -6,13 +6,13 @@
 namespace initialiser {
 namespace {
 
-// Text as bytes: each stands for itself, none is ever looked up in a locale.
+// Each byte stands for itself. None is looked up in a locale.
 class byte_traits {
 public:
     using char_type = char;
     using string_type = std::string;
     using locale_type = std::locale;
-    using char_class_type = unsigned char; // no class is known: always 0
+    using char_class_type = unsigned char; // always 0: no class is known
 
     static std::size_t length(const char* text) { return std::char_traits<char>::length(text); }
     static char translate(char byte) { return byte; }
@@ -20,7 +20,7 @@ public:
     template <typename iterator> static std::string transform(iterator first, iterator last) {
         return {first, last};
     }
-    // Asked about every byte of every bracket, to compare with the equivalence classes: none.
+    // The library compares this with a bracket's equivalence classes, of which there are none.
     template <typename iterator>
     static std::string transform_primary(iterator /*first*/, iterator /*last*/) {
         return {};
@@ -48,6 +48,7 @@ struct vorl_expression::automaton {
     std::basic_regex<char, byte_traits> regex;
 };
 
+// __polynomial is libstdc++'s name for the matcher without recursion.
 vorl_expression::vorl_expression(const char* pattern)
     : automaton_(new automaton{std::basic_regex<char, byte_traits>{
           pattern, std::regex_constants::ECMAScript | std::regex_constants::__polynomial}}) {}

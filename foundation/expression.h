@@ -6,14 +6,15 @@
 
 namespace initialiser {
 
-// A regular expression (ECMAScript grammar) over bytes, matched in bounded stack and linear time.
+// A regular expression (ECMAScript grammar) over bytes. It needs little stack and time in
+// proportion to the text's length.
 //
-// The standard library's usual matcher recurses once per character: a version word of 50,000
-// letters overflows the stack and ends every start-up by a signal. And building an expression with
-// the usual traits asks the locale about every byte of every bracket, which alone would cost more
-// than all the rest of a start-up. So the expressions here are matched without recursion and built
-// over traits that know no locale. The price: an expression may not name a character class (\d, \w,
-// [[:alpha:]]), for which std::regex_error is thrown.
+// The standard library's default matcher recurses once per character. A version word of 50,000
+// letters then overflows the stack and ends every start-up by a signal. And with the default
+// traits, building an expression asks the locale about every byte of every bracket, which costs
+// more than the rest of a start-up. So the expressions here are matched without recursion, and
+// their traits know no locale. They may not name a character class (\d, \w, [[:alpha:]]): the
+// constructor then throws std::regex_error.
 class vorl_expression {
 public:
     explicit vorl_expression(const char* pattern);
@@ -21,8 +22,8 @@ public:
     vorl_expression(const vorl_expression&) = delete;
     vorl_expression& operator=(const vorl_expression&) = delete;
 
-    // Matches the whole of `text`. Returns no entry when it doesn't match, otherwise the text
-    // itself and then each group's part, empty where the group took none.
+    // Matches the whole of `text`. Returns the text itself and then each group's part, empty where
+    // the group took none; nothing at all when the text doesn't match.
     std::vector<std::string> match_whole(const std::string& text) const;
 
 private:

@@ -10,7 +10,7 @@
 namespace initialiser {
 namespace {
 
-// Longer targets are cut here. No path that the start-up accepts comes near it.
+// Longer targets are cut here. No usable path comes near it.
 constexpr std::size_t longest_target = 1024;
 
 } // namespace

@@ -2,20 +2,18 @@
 
 #include <string>
 
-// Every fixed path and name on the device, written once. They are strings and not literals so that
-// none of them can slip into a C call by accident.
+// Every fixed path and name on the device, written once.
 namespace initialiser {
 
 // The storage area: what the updater and the initialiser keep, and the rest of the system reads.
 inline const std::string storage_area = "/var/db/timezone/";
-inline const std::string stored_datasets =
-    "/var/db/timezone/tz/"; // one folder each, named by version
+inline const std::string stored_datasets = "/var/db/timezone/tz/"; // a directory each
 
 // The links through which the system reads its time-zone data.
 inline const std::string zoneinfo_link = "/var/db/timezone/zoneinfo";
 inline const std::string icu_link = "/var/db/timezone/icutz"; // absent: the system's own ICU files
 inline const std::string localtime_link = "/var/db/timezone/localtime";
-inline const std::string latest_link = "/var/db/timezone/tz_latest"; // the updater's offer
+inline const std::string latest_link = "/var/db/timezone/tz_latest"; // the update on offer
 
 // What a start-up leaves for the programs that clean up and report.
 inline const std::string cleanup_marker = "/var/db/timezone/needs_cleanup";
@@ -30,10 +28,11 @@ inline const std::string system_zoneinfo = "/usr/share/zoneinfo.default";
 inline const std::string system_icu = "/usr/share/icu";
 
 // Inside a data set.
-inline const std::string zoneinfo_folder = "zoneinfo";
-inline const std::string icu_folder = "icutz";
-inline const std::string version_file = "+VERSION";       // in a tz database: its tz release
-inline const std::string schema_file = "icutzformat.txt"; // in the system's ICU folder: its schema
+inline const std::string zoneinfo_directory = "zoneinfo";
+inline const std::string icu_directory = "icutz";
+inline const std::string version_file = "+VERSION"; // in a tz database: its tz release
+inline const std::string schema_file =
+    "icutzformat.txt"; // in the system's ICU directory: its schema
 
 // The localtime link's zone when it names none that can be used, and where zones were looked up
 // before the storage area existed.

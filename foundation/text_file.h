@@ -6,13 +6,14 @@
 // path.
 namespace initialiser {
 
-// The first word of the file at `path`, links followed: leading white space is skipped, the next
-// white space or the end of the file ends it, and its length has no limit. A missing file is no
+// The first word of the file at `path`, links followed: leading white space is skipped, and the
+// next white space or the end of the file ends the word, however long it is. A missing file is no
 // error: that, a file that can't be read, and anything but a regular file give the empty text.
 std::string read_first_word(const std::string& path);
 
-// Makes `text` the whole content of the regular file at `path`, creating it with mode 0666 less the
-// mask. Where anything else stands, a link included, nothing is written; no failure is told.
+// Makes `text` the whole content of the regular file at `path`. A missing file is created with mode
+// 0666 less the mask. Where anything else stands, a link included, nothing is written. A failure is
+// passed over.
 void write_text(const std::string& path, const std::string& text);
 
 } // namespace initialiser

@@ -1,16 +1,22 @@
 #include "startup/dataset_phase.h"
 
 #include "dataset/dataset.h"
-#include "startup/cleanup_marker.h"
-#include "startup/current_links.h"
-#include "startup/version_diff_record.h"
+#include "foundation/file_system.h"
+#include "foundation/paths.h"
+#include "startup/notices.h"
 
 #include <err.h>
 
-#include <string>
-
 namespace initialiser {
 namespace {
+
+std::string read_latest_dataset_path() {
+    return read_symlink(latest_link);
+}
+
+std::string read_current_dataset_path() {
+    return dataset_path_of_zoneinfo_link(read_symlink(zoneinfo_link));
+}
 
 std::string current_path_or_reset() {
     try {
@@ -22,16 +28,12 @@ std::string current_path_or_reset() {
     }
 }
 
-bool usable(const vorl_dataset& current, const vorl_dataset& system) {
-    return current.compatible_with(system) && !system.newer_than(current);
-}
-
 void select_and_activate() {
     const vorl_dataset system;
     const std::string latest_path = read_latest_dataset_path();
     const vorl_dataset current{current_path_or_reset()};
 
-    const bool current_is_usable = usable(current, system);
+    const bool current_is_usable = current.compatible_with(system) && !system.newer_than(current);
     if (!current_is_usable) {
         warn("Symlink points at data incompatible with installed system");
         vorl_dataset::reset_to_system();
@@ -41,20 +43,20 @@ void select_and_activate() {
         return;
     }
 
-    // `current` is what the links named at the start-up. It stays the measure of an update even
-    // when it has just been rejected; what the update then replaces is `active`.
+    // An update is measured against `current`, what the links named at the start-up, even when that
+    // has just been rejected. What the update then replaces is `active`.
     const vorl_dataset& active = current_is_usable ? current : system;
-    const vorl_dataset latest{latest_path};
-    if (!latest.compatible_with(system) || !latest.newer_than(current)) {
-        warn("New update not compatible or older version: %s vs. %s", latest.version_text().c_str(),
+    const vorl_dataset update{latest_path};
+    if (!update.compatible_with(system) || !update.newer_than(current)) {
+        warn("New update not compatible or older version: %s vs. %s", update.version_text().c_str(),
              current.version_text().c_str());
         return;
     }
-    latest.activate();
+    update.activate();
     if (!active.same_path(system)) {
         touch_cleanup_marker();
     }
-    write_version_diff_record(active.version_text(), latest.version_text());
+    write_version_diff_record(active.version_text(), update.version_text());
 }
 
 } // namespace
@@ -66,6 +68,21 @@ void select_and_activate_dataset() {
         warn("Unable to locate data; resetting to system partition");
         vorl_dataset::reset_to_system();
     }
+}
+
+std::string dataset_path_of_zoneinfo_link(const std::string& target) {
+    if (target == system_zoneinfo) {
+        return {};
+    }
+    if (target.starts_with(stored_datasets)) {
+        const std::string::size_type end_of_path = target.rfind('/');
+        // The data set's own name has at least one byte.
+        if (end_of_path > stored_datasets.size()) {
+            return target.substr(0, end_of_path);
+        }
+    }
+    warn("Bad zoneinfo link %s", target.c_str());
+    throw no_error_number;
 }
 
 } // namespace initialiser

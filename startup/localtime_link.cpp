@@ -10,8 +10,6 @@
 namespace initialiser {
 namespace {
 
-constexpr int invalid_target = -1; // no system call failed: there is no error number
-
 void replace_localtime_link(const std::string& target) {
     discard(localtime_link);
     create_symlink(target, localtime_link);
@@ -23,12 +21,12 @@ void accept_or_correct() {
         return;
     }
     if (!target.starts_with(old_zoneinfo)) {
-        throw invalid_target;
+        throw no_error_number;
     }
     target.replace(0, old_zoneinfo.size(), zoneinfo_link);
     warn("Correcting localtime link to %s", target.c_str());
     if (!exists(target)) {
-        throw invalid_target;
+        throw no_error_number;
     }
     replace_localtime_link(target);
 }

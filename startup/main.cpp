@@ -1,7 +1,45 @@
+#include "foundation/file_system.h"
+#include "foundation/paths.h"
+#include "startup/dataset_phase.h"
+#include "startup/localtime_link.h"
 #include "startup/process_guards.h"
-#include "startup/start_up.h"
+#include "startup/storage.h"
+
+#include <err.h>
+
+#include <cstdlib>
+
+namespace initialiser {
+namespace {
+
+// One start-up: six phases in a fixed order, each working on what the ones before left on disk.
+// Returns the exit status. It is 0 at the end, whatever was found and corrected on the way.
+int start_up() {
+    try {
+        prepare_storage();
+        migrate_legacy_icutz();
+        discard(cleanup_marker);
+        discard(legacy_item);
+        select_and_activate_dataset();
+    } catch (...) {
+        warn("The time-zone links could not be reset");
+        // Without a zoneinfo link the user's zone would look invalid, and the repair of the
+        // localtime link would lose it. So that link is left to the next start-up.
+        return EXIT_FAILURE;
+    }
+    try {
+        repair_localtime_link();
+    } catch (...) {
+        warn("The localtime link could not be set");
+        return EXIT_FAILURE;
+    }
+    return EXIT_SUCCESS;
+}
+
+} // namespace
+} // namespace initialiser
 
 int main() {
     initialiser::guard_process();
-    return initialiser::run_start_up();
+    return initialiser::start_up();
 }

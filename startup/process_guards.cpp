@@ -13,12 +13,12 @@
 namespace initialiser {
 namespace {
 
-// Enough for any text that could be meant (a version word of 30 million bytes), and far below what
-// would take the memory from the rest of the system.
+// Far above what any real data need (a version word of 20 million bytes still fits), and far below
+// what the rest of the system would miss.
 constexpr rlim_t memory_bound = rlim_t{256} << 20U;
 
 // Fills the closed ones of descriptors 0 to 2 with one that can neither be read nor written. The
-// root folder serves since a bare root has no /dev/null.
+// root directory serves since a bare root has no /dev/null.
 void occupy_standard_descriptors() noexcept {
     int filler = 0;
     while (filler >= 0 && filler <= STDERR_FILENO) {

@@ -3,9 +3,10 @@
 namespace initialiser {
 
 // Makes the process independent of how it was started, before anything is opened or printed:
-// - messages carry the program's own name, a line of usual length is one write, and none can end
-//   the process or land in a file opened under the number of a closed standard error;
-// - a file-size limit fails a write instead of ending the process;
+// - messages carry the program's own name, and a line of usual length is one write;
+// - a message can't end the process when nobody reads it, nor land in a file that was opened under
+//   the number of a closed standard error;
+// - a limit on the size of files fails a write instead of ending the process;
 // - memory has a bound, so that an endless file is a failure like any other.
 // What can't be set stays as it was.
 void guard_process() noexcept;

@@ -1,14 +1,16 @@
 #pragma once
 
-#include <string>
-
 namespace initialiser {
 
-// Gives the storage area and the folder of the stored data sets the data-protection class that can
-// be read at start-up. A missing folder is no error and is not made; nothing is printed.
+// Gives the storage area and the directory of the stored data sets the data-protection class that
+// can be read at start-up. A missing directory is no error and is not made. Prints and throws
+// nothing.
 void prepare_storage() noexcept;
 
-// The same for the folder at `path`.
-void set_directory_protection(const std::string& path) noexcept;
+// Moves the ICU link of older systems into the storage area with its target text unchanged, unless
+// a link that leads somewhere is there already; then removes the old link. A link that leads
+// nowhere counts as missing in both places. A failure is passed over after the failed operation's
+// line and "Could not migrate OLD to NEW" or "Could not remove OLD".
+void migrate_legacy_icutz();
 
 } // namespace initialiser

@@ -1,9 +1,9 @@
-#include "startup/cleanup_marker.h"
+#include "startup/notices.h"
 
 #include "foundation/data_protection.h"
 #include "foundation/descriptor.h"
-#include "foundation/file_system.h"
 #include "foundation/paths.h"
+#include "foundation/text_file.h"
 
 #include <err.h>
 #include <fcntl.h>
@@ -33,8 +33,13 @@ void touch_cleanup_marker() noexcept {
     }
 }
 
-void remove_cleanup_marker() noexcept {
-    discard(cleanup_marker);
+void write_version_diff_record(const std::string& old_version,
+                               const std::string& new_version) noexcept {
+    try {
+        write_text(version_diff_record, old_version + "_" + new_version);
+    } catch (...) {
+        // Out of memory. The update is in place, and an old record is no reason to undo it.
+    }
 }
 
 } // namespace initialiser

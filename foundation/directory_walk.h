@@ -1,0 +1,48 @@
+#pragma once
+
+#include <dirent.h>
+#include <fcntl.h>
+#include <sys/stat.h>
+
+#include <cerrno>
+#include <memory>
+#include <string>
+
+namespace initialiser {
+
+// A walk over the entries of one directory, in the order in which the file system yields them. It
+// reads no further than it is asked to and never looks below the directory, so that neither a huge
+// directory nor a deep one costs more than what stands before the entry sought.
+class vorl_directory_walk {
+public:
+    // Opens the walk; `path` itself may be a link. A missing directory is no error, nor is one that
+    // can't be read or isn't a directory: the walk then has no entries.
+    explicit vorl_directory_walk(const std::string& path)
+        : directory_(::opendir(path.c_str())),
+          out_of_memory_(directory_ == nullptr && errno == ENOMEM) {}
+
+    // True when there was no memory to open the walk. The error number then says so.
+    bool out_of_memory() const { return out_of_memory_; }
+
+    // The name of the next entry, or nullptr at the end and after a failure, which ends the walk.
+    const char* next() {
+        const dirent* const entry = directory_ ? ::readdir(directory_.get()) : nullptr;
+        return entry != nullptr ? entry->d_name : nullptr;
+    }
+
+    // True when the entry `name` is a regular file, not a link to one, that everyone may read.
+    bool is_public_file(const char* name) const {
+        struct stat status {};
+        return ::fstatat(::dirfd(directory_.get()), name, &status, AT_SYMLINK_NOFOLLOW) == 0 &&
+               S_ISREG(status.st_mode) && (status.st_mode & S_IROTH) != 0;
+    }
+
+private:
+    struct directory_closer {
+        void operator()(DIR* directory) const { ::closedir(directory); }
+    };
+    std::unique_ptr<DIR, directory_closer> directory_;
+    bool out_of_memory_;
+};
+
+} // namespace initialiser
