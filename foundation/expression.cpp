@@ -3,6 +3,10 @@
 #include <locale>
 #include <regex>
 
+#ifndef __GLIBCXX__
+#error "libstdc++ is needed: other standard libraries match regular expressions by recursion"
+#endif
+
 namespace initialiser {
 namespace {
 
