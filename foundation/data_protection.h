@@ -1,9 +1,10 @@
 #pragma once
 
+#include "foundation/descriptor.h"
+
 #include <fcntl.h>
 #include <sys/types.h>
 
-#include <cerrno>
 #include <string>
 
 // Data-protection classes say when the keys to a file are at hand. Linux has none. These are
@@ -17,12 +18,11 @@ inline constexpr int always_readable = 4;
 // The file-control command that sets the class of an open directory.
 inline constexpr int set_class_command = 64;
 
-// Applies a data-protection command to an open directory. Here it changes nothing, returns -1 and
-// sets the error number to ENOTSUP. The kernel is not asked: to it, the command's number may one
-// day mean something else.
+// Applies a data-protection command to an open directory. Here it changes nothing and returns -1.
+// It leaves the error number alone, which would show up behind the next message. The kernel is not
+// asked: to it, the command's number may one day mean something else.
 inline int control_protection(int /*descriptor*/, int /*command*/,
                               int /*protection_class*/) noexcept {
-    errno = ENOTSUP;
     return -1;
 }
 
@@ -32,7 +32,9 @@ inline int control_protection(int /*descriptor*/, int /*command*/,
 // reader.
 inline int open_protected(const std::string& path, int flags, int /*protection_class*/,
                           int /*option_flags*/, mode_t mode) noexcept {
-    return ::open(path.c_str(), flags | O_NOFOLLOW | O_NONBLOCK | O_NOCTTY | O_CLOEXEC, mode);
+    return repeat_interrupted([&] {
+        return ::open(path.c_str(), flags | O_NOFOLLOW | O_NONBLOCK | O_NOCTTY | O_CLOEXEC, mode);
+    });
 }
 
 } // namespace initialiser

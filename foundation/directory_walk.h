@@ -1,5 +1,7 @@
 #pragma once
 
+#include "foundation/descriptor.h"
+
 #include <dirent.h>
 #include <fcntl.h>
 #include <sys/stat.h>
@@ -7,6 +9,7 @@
 #include <cerrno>
 #include <memory>
 #include <string>
+#include <utility>
 
 namespace initialiser {
 
@@ -18,7 +21,7 @@ public:
     // Opens the walk; `path` itself may be a link. A missing directory is no error, nor is one that
     // can't be read or isn't a directory: the walk then has no entries.
     explicit vorl_directory_walk(const std::string& path)
-        : directory_(::opendir(path.c_str())),
+        : directory_(repeat_interrupted([&] { return ::opendir(path.c_str()); })),
           out_of_memory_(directory_ == nullptr && errno == ENOMEM) {}
 
     // True when there was no memory to open the walk. The error number then says so.
@@ -26,7 +29,7 @@ public:
 
     // The name of the next entry, or nullptr at the end and after a failure, which ends the walk.
     const char* next() {
-        const dirent* const entry = directory_ ? ::readdir(directory_.get()) : nullptr;
+        const dirent* const entry = directory_ ? read_entry() : nullptr;
         return entry != nullptr ? entry->d_name : nullptr;
     }
 
@@ -41,6 +44,18 @@ private:
     struct directory_closer {
         void operator()(DIR* directory) const { ::closedir(directory); }
     };
+
+    // The end of a directory sets no error number, so an earlier one is put aside.
+    const dirent* read_entry() {
+        const int earlier = std::exchange(errno, 0);
+        const dirent* const entry =
+            repeat_interrupted([this] { return ::readdir(directory_.get()); });
+        if (errno == 0) {
+            errno = earlier;
+        }
+        return entry;
+    }
+
     std::unique_ptr<DIR, directory_closer> directory_;
     bool out_of_memory_;
 };

@@ -4,64 +4,64 @@
 
 #include <fcntl.h>
 #include <sys/stat.h>
-#include <unistd.h>
 
+#include <algorithm>
 #include <array>
-#include <cerrno>
-#include <fstream>
 #include <string_view>
 
 namespace initialiser {
 namespace {
 
-// The white space of the classic "C" locale.
-constexpr std::string_view white_space = " \t\n\v\f\r";
+constexpr std::size_t block_size = 65536;
+constexpr mode_t new_file_mode = 0666; // less the process's mask
 
-constexpr std::size_t block_size = 4096;
-
-// Asked before the open: opening a FIFO can wait, and opening a device can act (a watchdog starts).
-bool leads_to_regular_file(const std::string& path) {
+// Opens the regular file at `path`, without following a link there when the flags say so. Gives a
+// closed descriptor for anything else. It looks before the open, since opening a device can act (a
+// watchdog starts), and after it, since another file may have taken the place in between.
+vorl_descriptor open_regular_file(const std::string& path, int flags) noexcept {
+    const int follow = (flags & O_NOFOLLOW) != 0 ? AT_SYMLINK_NOFOLLOW : 0;
     struct stat status {};
-    return ::stat(path.c_str(), &status) == 0 && S_ISREG(status.st_mode);
+    const bool is_there = ::fstatat(AT_FDCWD, path.c_str(), &status, follow) == 0;
+    if (is_there ? !S_ISREG(status.st_mode) : (flags & O_CREAT) == 0) {
+        return vorl_descriptor{-1};
+    }
+    // O_NONBLOCK: a FIFO may have come, and some kernel files pass for regular ones and wait for
+    // their next line.
+    vorl_descriptor file{repeat_interrupted([&] {
+        return ::open(path.c_str(), flags | O_CLOEXEC | O_NONBLOCK | O_NOCTTY, new_file_mode);
+    })};
+    if (file.is_open() && (::fstat(file.number(), &status) != 0 || !S_ISREG(status.st_mode))) {
+        file.close();
+    }
+    return file;
 }
 
-bool is_free_or_regular_file(const std::string& path) {
-    struct stat status {};
-    if (::lstat(path.c_str(), &status) != 0) {
-        return errno == ENOENT;
-    }
-    return S_ISREG(status.st_mode);
+// White space of the classic "C" locale.
+bool is_blank(char byte) {
+    return byte == ' ' || (byte >= '\t' && byte <= '\r');
 }
 
 // Adds to `word` what `block` holds of it. True when white space has ended it.
 bool extend_word(std::string& word, std::string_view block) {
-    for (const char byte : block) {
-        const bool blank = white_space.find(byte) != std::string_view::npos;
-        if (blank && !word.empty()) {
-            return true;
-        }
-        if (!blank) {
-            word += byte;
-        }
-    }
-    return false;
+    const auto* const first =
+        word.empty() ? std::find_if_not(block.begin(), block.end(), is_blank) : block.begin();
+    const auto* const last = std::find_if(first, block.end(), is_blank);
+    word.append(first, last);
+    return last != block.end();
 }
 
 } // namespace
 
 std::string read_first_word(const std::string& path) {
-    if (!leads_to_regular_file(path)) {
-        return {};
-    }
-    // O_NONBLOCK: some kernel files pass for regular ones and wait for their next line.
-    const vorl_descriptor file{::open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK | O_NOCTTY)};
+    const vorl_descriptor file = open_regular_file(path, O_RDONLY);
     if (!file.is_open()) {
         return {};
     }
     std::string word;
-    std::array<char, block_size> block{};
+    std::array<char, block_size> block; // not filled: most files hold a few bytes
     while (true) {
-        const ssize_t length = ::read(file.number(), block.data(), block.size());
+        const ssize_t length =
+            repeat_interrupted([&] { return ::read(file.number(), block.data(), block.size()); });
         if (length < 0) {
             return {};
         }
@@ -72,10 +72,22 @@ std::string read_first_word(const std::string& path) {
     }
 }
 
-void write_text(const std::string& path, const std::string& text) {
-    if (is_free_or_regular_file(path)) {
-        std::ofstream{path, std::ios::trunc} << text;
+void write_text(const std::string& path, const std::string& text) noexcept {
+    // Truncated only once it is known to be the file that is meant.
+    const vorl_descriptor file = open_regular_file(path, O_WRONLY | O_CREAT | O_NOFOLLOW);
+    if (!file.is_open() || ::ftruncate(file.number(), 0) != 0) {
+        return;
     }
+    std::string_view rest{text};
+    while (!rest.empty()) {
+        const ssize_t length =
+            repeat_interrupted([&] { return ::write(file.number(), rest.data(), rest.size()); });
+        if (length <= 0) {
+            return;
+        }
+        rest.remove_prefix(static_cast<std::size_t>(length));
+    }
+    static_cast<void>(repeat_interrupted([&] { return ::fsync(file.number()); }));
 }
 
 } // namespace initialiser

@@ -2,8 +2,9 @@
 
 #include <string>
 
-// Small text files. Neither operation waits, prints or acts on a device, whatever stands at the
-// path.
+// Small text files. Neither operation waits, prints, or reads or writes anything but a regular
+// file, whatever stands at the path and even when it is exchanged meanwhile. A device that stands
+// there is not opened either, unless it takes a file's place in the instant before the open.
 namespace initialiser {
 
 // The first word of the file at `path`, links followed: leading white space is skipped, and the
@@ -11,9 +12,9 @@ namespace initialiser {
 // error: that, a file that can't be read, and anything but a regular file give the empty text.
 std::string read_first_word(const std::string& path);
 
-// Makes `text` the whole content of the regular file at `path`. A missing file is created with mode
-// 0666 less the mask. Where anything else stands, a link included, nothing is written. A failure is
-// passed over.
-void write_text(const std::string& path, const std::string& text);
+// Makes `text` the whole content of the regular file at `path`, and flushes it to the disk. A
+// missing file is created with mode 0666 less the mask. Where anything else stands, a link
+// included, nothing is written. A failure is passed over.
+void write_text(const std::string& path, const std::string& text) noexcept;
 
 } // namespace initialiser

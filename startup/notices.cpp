@@ -38,7 +38,7 @@ void write_version_diff_record(const std::string& old_version,
     try {
         write_text(version_diff_record, old_version + "_" + new_version);
     } catch (...) {
-        // Out of memory. The update is in place, and an old record is no reason to undo it.
+        // No memory for the text. An old record is no reason to undo the update.
     }
 }
 

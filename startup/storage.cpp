@@ -14,7 +14,8 @@ namespace initialiser {
 namespace {
 
 void set_directory_protection(const std::string& path) noexcept {
-    const vorl_descriptor directory{::open(path.c_str(), O_RDONLY | O_CLOEXEC)};
+    const vorl_descriptor directory{
+        repeat_interrupted([&] { return ::open(path.c_str(), O_RDONLY | O_CLOEXEC); })};
     if (directory.is_open()) {
         control_protection(directory.number(), set_class_command, always_readable);
     }
