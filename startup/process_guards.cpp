@@ -30,7 +30,7 @@ void occupy_standard_descriptors() noexcept {
 }
 
 void bound_memory() noexcept {
-#ifndef __SANITIZE_ADDRESS__ // whose shadow memory is far larger
+#ifndef VORL_MEMORY_UNBOUNDED
     rlimit data{};
     if (::getrlimit(RLIMIT_DATA, &data) == 0) {
         data.rlim_cur = std::min(data.rlim_cur, memory_bound);
