@@ -75,7 +75,7 @@ std::string read_first_word(const std::string& path) {
 void write_text(const std::string& path, const std::string& text) noexcept {
     // Truncated only once it is known to be the file that is meant.
     const vorl_descriptor file = open_regular_file(path, O_WRONLY | O_CREAT | O_NOFOLLOW);
-    if (!file.is_open() || ::ftruncate(file.number(), 0) != 0) {
+    if (!file.is_open() || repeat_interrupted([&] { return ::ftruncate(file.number(), 0); }) != 0) {
         return;
     }
     std::string_view rest{text};
