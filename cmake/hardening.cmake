@@ -19,7 +19,10 @@ foreach(level 3 2)
 endforeach()
 unset(CMAKE_REQUIRED_FLAGS)
 
-target_compile_options(vorl_options INTERFACE -ffunction-sections -fdata-sections)
+# Without the paths of this machine the program is the same wherever it is built.
+target_compile_options(vorl_options INTERFACE
+  -ffunction-sections -fdata-sections
+  -ffile-prefix-map=${PROJECT_SOURCE_DIR}=. -ffile-prefix-map=${PROJECT_BINARY_DIR}=.)
 target_link_options(vorl_executable INTERFACE
   -Wl,--gc-sections -Wl,-z,relro,-z,now,-z,noexecstack)
 
