@@ -1,13 +1,14 @@
-# The cost of a start-up over the number of things on the device. Reads growth/*.
+# The cost of a start-up over the number of files on the device. Reads the file growth.
+set terminal dumb size 79,32
 set multiplot layout 2,1
 set logscale xy
 set format xy "%.0s%c"
 set key left top
-do for [column in "instructions calls"] {
-    set title column eq "calls" ? "system calls" : "instructions"
-    set yrange [(column eq "calls" ? 10 : 1e5):(column eq "calls" ? 1e4 : 1e9)]
-    plot "growth/folder" using "number":column with linespoints title "files in icutz", \
-         "growth/below" using "number":column with linespoints title "files below icutz", \
-         "growth/sets" using "number":column with linespoints title "stored data sets"
+do for [offset=0:1] {
+    set title offset ? "system calls" : "instructions"
+    set yrange [(offset ? 10 : 1e5):(offset ? 1e4 : 1e9)]
+    plot "growth" using 1:(column(6 + offset)) with linespoints title "ICU files, no schema in them", \
+         "" using 1:(column(4 + offset)) with linespoints title "files below an icutz directory", \
+         "" using 1:(column(2 + offset)) with linespoints title "stored data sets"
 }
 unset multiplot
