@@ -3,23 +3,34 @@
 #include "foundation/paths.h"
 
 #include <fcntl.h>
+#include <poll.h>
 #include <sched.h>
 #include <sys/mman.h>
 #include <sys/mount.h>
+#include <sys/prctl.h>
 #include <sys/stat.h>
+#include <sys/syscall.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
+#include <array>
 #include <cerrno>
+#include <csignal>
 #include <filesystem>
 #include <fstream>
+#include <iterator>
 #include <sstream>
+#include <stdexcept>
 #include <system_error>
 
 namespace fs = std::filesystem;
 
 namespace initialiser {
 namespace {
+
+constexpr int most_milliseconds = 20'000; // of one start-up, which takes a few
+constexpr off_t huge = off_t{3} << 30U;   // too large for 32 bits
+constexpr time_t in_2040 = 2208988800;    // too late for 32 bits
 
 void must(bool done, const std::string& what) {
     if (!done) {
@@ -39,7 +50,7 @@ std::string read_file(const fs::path& path) {
     return text.str();
 }
 
-// Root makes a mount namespace; anybody else needs a user namespace around it, where the kernel
+// Root makes a mount namespace. Anybody else needs a user namespace around it, where the kernel
 // allows that.
 bool enter_namespace() {
     const std::string user = std::to_string(geteuid());
@@ -56,71 +67,78 @@ bool enter_namespace() {
     must(setns(mounts, CLONE_NEWNS) == 0, "no way to the root of the mounts");
     must(mount(nullptr, "/", nullptr, MS_REC | MS_PRIVATE, nullptr) == 0, "no private mounts");
     must(fchdir(root) == 0 && chroot(".") == 0, "no way back");
+    prctl(PR_SET_CHILD_SUBREAPER, 1); // a tracer is waited for as well
     return true;
 }
 
-// Opened before the first device hides the place where it may have been built.
-int program() {
-    static const int descriptor = open(VORL_PROGRAM, O_PATH | O_CLOEXEC);
-    return descriptor;
-}
-
-fs::path full(const std::string& path) {
-    return path.starts_with('/') ? path : storage_area + path;
-}
-
-std::string description(const fs::path& path) {
-    const fs::file_status status = fs::symlink_status(path);
-    if (fs::is_symlink(status)) {
-        return "-> " + fs::read_symlink(path).string();
-    }
-    if (fs::is_regular_file(status)) {
-        return fs::is_empty(path) ? "=" : "= " + read_file(path);
-    }
-    return fs::is_directory(status) ? "folder" : "fifo";
-}
-
-void put_one(const std::string& path, const std::string& what) {
-    if (what.starts_with("dataset ")) {
-        device::put({{path + "/zoneinfo/+VERSION", "= an updater's"},
-                     {path + "/zoneinfo/Asia/Tokyo", "= TZif"},
-                     {path + "/icutz/" + what.substr(8), "= data"}});
-        return;
-    }
-    const fs::path place = full(path);
-    fs::remove_all(place);
-    fs::create_directories(place.parent_path());
-    if (what == "folder") {
-        fs::create_directory(place);
-    } else if (what == "fifo") {
-        must(mkfifo(place.c_str(), 0644) == 0, path);
-    } else if (what.starts_with("-> ")) {
-        fs::create_symlink(what.substr(3), place);
-    } else if (what.starts_with("= ")) {
-        write_file(place, what.substr(2));
-    } else if (what != "nothing") {
-        write_file(place, "");
-        fs::permissions(place, fs::perms{what == "private" ? 0600U : 0644U});
-    }
-}
-
-tree survey(std::string (*describe)(const fs::path&)) {
-    tree all;
-    for (const char* const root : {"/var", "/usr/share"}) {
-        for (const auto& entry : fs::recursive_directory_iterator{root}) {
-            all[entry.path()] = describe(entry.path());
+// The same changes with full paths, and each shorthand as what it stands for.
+changes in_full(const changes& list) {
+    changes all;
+    for (const auto& [path, what] : list) {
+        const std::string place = path.starts_with('/') ? path : storage_area + path;
+        if (path == "update") {
+            all.emplace_back(latest_link, "-> " + stored_datasets + what);
+        } else if (path == "links") {
+            const bool stored = what != "system";
+            const std::string dataset = "-> " + stored_datasets + what;
+            all.emplace_back(zoneinfo_link,
+                             stored ? dataset + "/zoneinfo" : "-> " + system_zoneinfo);
+            all.emplace_back(icu_link, stored ? dataset + "/icutz" : "nothing");
+        } else if (what.starts_with("dataset ")) {
+            all.emplace_back(place + "/zoneinfo/+VERSION", "= an updater's");
+            all.emplace_back(place + "/zoneinfo/Asia/Tokyo", "= TZif");
+            all.emplace_back(place + "/icutz/" + what.substr(8), "= data");
+        } else {
+            all.emplace_back(place, what);
         }
     }
     return all;
 }
 
+void put_one(const fs::path& path, const std::string& what) {
+    if (what == "huge") {
+        return must(truncate(path.c_str(), huge) == 0, path);
+    }
+    if (what == "late") {
+        const std::array times = {timespec{in_2040, 0}, timespec{in_2040, 0}};
+        return must(utimensat(AT_FDCWD, path.c_str(), times.data(), 0) == 0, path);
+    }
+    fs::remove_all(path);
+    fs::create_directories(path.parent_path());
+    if (what == "directory") {
+        fs::create_directory(path);
+    } else if (what == "fifo") {
+        must(mkfifo(path.c_str(), 0644) == 0, path);
+    } else if (what.starts_with("-> ")) {
+        fs::create_symlink(what.substr(3), path);
+    } else if (what == "=" || what == "private" || what.starts_with("= ")) {
+        write_file(path, what.starts_with("= ") ? what.substr(2) : "");
+        fs::permissions(path, fs::perms{what == "private" ? 0600U : 0644U});
+    } else if (what != "nothing") {
+        throw std::invalid_argument("no such thing: " + what);
+    }
+}
+
+std::string description(const fs::path& path, const struct stat& status) {
+    switch (status.st_mode & S_IFMT) {
+    case S_IFLNK:
+        return "-> " + fs::read_symlink(path).string();
+    case S_IFREG:
+        return status.st_size == 0 ? "=" : "= " + (status.st_size < huge ? read_file(path) : "");
+    default:
+        return S_ISDIR(status.st_mode) ? "directory" : "fifo";
+    }
+}
+
 } // namespace
 
-device::device() {
-    static const bool entered = program() >= 0 && enter_namespace();
+vorl_device::vorl_device(const changes& found)
+    : program_(open(VORL_PROGRAM, O_PATH)), hidden_{"/usr/share", "/var"} {
+    static const bool entered = program_.is_open() && enter_namespace();
     must(entered, "no program");
-    must(mount("device", "/usr/share", "tmpfs", 0, "mode=755") == 0, "no private /usr/share");
-    must(mount("device", "/var", "tmpfs", 0, "mode=755") == 0, "no private /var");
+    for (const std::string& path : hidden_) {
+        must(mount("device", path.c_str(), "tmpfs", 0, "mode=755") == 0, "no private " + path);
+    }
     put({{"/usr/share/zoneinfo.default/+VERSION", "= 2019c\n"},
          {"/usr/share/zoneinfo.default/Asia/Tokyo", "= TZif"},
          {"/usr/share/icu/icutzformat.txt", "= 44l\n"},
@@ -128,58 +146,86 @@ device::device() {
          {"tz/2020a.1.0", "dataset icutz44l.dat"},
          {"tz/2020b.1.0", "dataset icutz44l.dat"},
          {"tz/2021a.1.0", "dataset icutz46l.dat"},
-         {"zoneinfo", "-> /usr/share/zoneinfo.default"},
+         {"links", "system"},
          {"localtime", "-> /var/db/timezone/zoneinfo/Europe/Paris"}});
+    put(found);
 }
 
-device::~device() {
-    umount2("/var", MNT_DETACH);
-    umount2("/usr/share", MNT_DETACH);
+vorl_device::~vorl_device() {
+    for (const std::string& path : hidden_) {
+        umount2(path.c_str(), MNT_DETACH);
+    }
 }
 
-void device::put(const changes& list) {
-    for (const auto& [path, what] : list) {
+void vorl_device::put(const changes& list) {
+    for (const auto& [path, what] : in_full(list)) {
+        if (!path.starts_with(hidden_[0]) && !path.starts_with(hidden_[1])) {
+            throw std::invalid_argument("the machine's own: " + path);
+        }
         put_one(path, what);
     }
 }
 
-tree device::contents() {
-    return survey(description);
+tree vorl_device::contents(bool stamped) const {
+    tree all;
+    for (const std::string& path : hidden_) {
+        for (const auto& entry : fs::recursive_directory_iterator{path}) {
+            struct stat status {}; // the library's own knows no huge or late file on 32 bits
+            must(lstat(entry.path().c_str(), &status) == 0, entry.path());
+            all[entry.path()] = description(entry.path(), status);
+            if (stamped) {
+                all[entry.path()] += " " + std::to_string(status.st_ino) + " " +
+                                     std::to_string(status.st_ctim.tv_sec) + "." +
+                                     std::to_string(status.st_ctim.tv_nsec);
+            }
+        }
+    }
+    return all;
 }
 
-tree device::stamps() {
-    return survey([](const fs::path& path) {
-        struct stat status {};
-        must(lstat(path.c_str(), &status) == 0, path);
-        return std::to_string(status.st_ino) + " " + std::to_string(status.st_ctim.tv_sec) + "." +
-               std::to_string(status.st_ctim.tv_nsec);
-    });
-}
+outcome vorl_device::start_up(const messages& tracer, const std::function<void()>& prepare) const {
+    std::istringstream emulator{VORL_EMULATOR}; // with its options
+    messages words{std::istream_iterator<std::string>{emulator}, {}};
+    words.insert(words.end(), tracer.begin(), tracer.end());
+    words.push_back("/proc/self/fd/" + std::to_string(program_.number()));
+    std::vector<char*> arguments;
+    for (std::string& word : words) {
+        arguments.push_back(word.data());
+    }
+    arguments.push_back(nullptr);
 
-outcome device::start_up(const std::function<void()>& prepare,
-                         const std::function<void(int)>& attend) {
-    static char name[] = "/any/where/started as something else";
-    char* const arguments[] = {name, nullptr};
-    const int log = memfd_create("log", MFD_CLOEXEC);
+    const vorl_descriptor log{memfd_create("log", MFD_CLOEXEC)};
     const pid_t child = fork();
-    must(log >= 0 && child >= 0, "no process for the program");
+    must(log.is_open() && child >= 0, "no process for the program");
     if (child == 0) {
-        dup2(log, STDERR_FILENO);
-        prepare();
-        fexecve(program(), arguments, environ);
+        prctl(PR_SET_PDEATHSIG, SIGKILL); // it doesn't outlive a test that is killed
+        dup2(log.number(), STDERR_FILENO);
+        if (prepare) {
+            prepare();
+        }
+        execvp(arguments.front(), arguments.data());
         _exit(127);
     }
-    attend(child);
+    const vorl_descriptor process{static_cast<int>(syscall(SYS_pidfd_open, child, 0))};
+    pollfd end{process.number(), POLLIN, 0};
+    const bool hangs = poll(&end, 1, most_milliseconds) == 0;
+    if (hangs) {
+        kill(child, SIGKILL);
+    }
     int status = 0;
     must(waitpid(child, &status, 0) == child, "the program is lost");
-    const std::string printed = read_file("/proc/self/fd/" + std::to_string(log));
-    close(log);
-    return {WIFSIGNALED(status) ? 128 + WTERMSIG(status) : WEXITSTATUS(status), printed};
+    while (waitpid(-1, nullptr, 0) > 0) {
+    }
+    if (hangs) {
+        throw std::runtime_error("the program did not end, and was killed");
+    }
+    return {WIFSIGNALED(status) ? 128 + WTERMSIG(status) : WEXITSTATUS(status),
+            read_file("/proc/self/fd/" + std::to_string(log.number()))};
 }
 
 tree after(tree contents, const changes& list) {
-    for (const auto& [path, what] : list) {
-        contents[full(path)] = what;
+    for (const auto& [path, what] : in_full(list)) {
+        contents[path] = what;
     }
     std::erase_if(contents, [](const auto& entry) { return entry.second == "nothing"; });
     return contents;

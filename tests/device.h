@@ -1,5 +1,7 @@
 #pragma once
 
+#include "foundation/descriptor.h"
+
 #include <functional>
 #include <map>
 #include <string>
@@ -8,8 +10,7 @@
 
 namespace initialiser {
 
-// What is put on a device, in order: a path and what stands there, as tests/scenarios/README.md
-// tells both.
+// Paths and what is put, or expected, there. tests/scenarios/README.md explains both.
 using changes = std::vector<std::pair<std::string, std::string>>;
 using tree = std::map<std::string, std::string>;
 using messages = std::vector<std::string>;
@@ -19,32 +20,35 @@ struct outcome {
     std::string printed;
 };
 
-// A device of the test's own. Its /var and /usr/share hide the machine's, for this process and its
-// children only, so that the program's fixed paths are the real ones.
-class device {
+// A device, new from the factory but for the changes of `found`. For this process and its children
+// its /var and /usr/share hide the machine's, so that the program's fixed paths are the real ones.
+class vorl_device {
 public:
     // Throws where neither root nor a namespace can be had: a test never passes unrun.
-    device();
-    ~device();
-    device(const device&) = delete;
-    device& operator=(const device&) = delete;
+    explicit vorl_device(const changes& found = {});
+    ~vorl_device();
+    vorl_device(const vorl_device&) = delete;
+    vorl_device& operator=(const vorl_device&) = delete;
 
-    static void put(const changes& list);
-    static tree contents();
-    static tree stamps(); // what tells a file made anew from one left alone
+    void put(const changes& list);
 
-    // One start-up: runs the real program. `prepare` runs in the new process just before it,
-    // `attend` in this one, with the new one's number, until the program is left to itself.
-    static outcome start_up(
-        const std::function<void()>& prepare = [] {},
-        const std::function<void(int)>& attend = [](int) {});
+    // With `stamped`, a file that was made anew differs from one that was left alone.
+    tree contents(bool stamped = false) const;
+
+    // One start-up of the real program, through `tracer` if there is one. `prepare` runs in the new
+    // process before it. A program that doesn't end is killed, and an exception says so.
+    outcome start_up(const messages& tracer = {}, const std::function<void()>& prepare = {}) const;
+
+private:
+    vorl_descriptor program_; // opened before something hides it
+    messages hidden_;
 };
 
-// `contents` of a device after the changes of `list`.
+// `contents` after the changes of `list`.
 tree after(tree contents, const changes& list);
 
-// The lines of what `program` printed, less its name; each also less the error text after it where
-// the line expected in its place has none.
+// The lines of what a program of the name `program` printed. The name is left out; so is the error
+// text where the line expected in the same place has none.
 messages lines_of(const std::string& printed, const messages& expected,
                   const std::string& program = "vorl_initialiser");
 

@@ -2,188 +2,247 @@
 
 #include <fcntl.h>
 #include <gtest/gtest.h>
-#include <linux/filter.h>
-#include <linux/seccomp.h>
-#include <poll.h>
-#include <sys/ioctl.h>
-#include <sys/prctl.h>
 #include <sys/resource.h>
-#include <sys/syscall.h>
-#include <sys/wait.h>
 #include <unistd.h>
 
-#include <algorithm>
 #include <array>
-#include <cerrno>
 #include <csignal>
 #include <filesystem>
-#include <stdexcept>
+#include <fstream>
+#include <iostream>
+#include <regex>
 
-// What a start-up survives: each of its file-system calls failing, the power cut at each of them,
-// and a standard error that can't take a message.
+// What a start-up survives: each of its calls for files failing or interrupted, the power cut at
+// each of them, and a standard error that can't take a line.
 namespace initialiser {
 namespace {
 
-constexpr int listener_number = 100; // the same in every new process, so that this one can find it
-constexpr int cut_power = -1;
-
-constexpr std::array watched_calls = {
-    SYS_rt_sigaction, SYS_exit_group, // these two only tell where the start-up begins and ends
-    SYS_openat,       SYS_close,      SYS_read,    SYS_write,  SYS_fstat, SYS_newfstatat,
-    SYS_getdents64,   SYS_fcntl,
-#ifdef SYS_unlink
-    SYS_access,       SYS_readlink,   SYS_symlink, SYS_unlink, SYS_rmdir
-#else
-    SYS_faccessat,    SYS_readlinkat, SYS_symlinkat, SYS_unlinkat
-#endif
+struct file_call {
+    std::string name;  // as strace has it: "unlinkat" on some machines, where others have "unlink"
+    int count = 0;     // which of the calls of that name it is
+    std::string text;  // the name without "at", then the paths in their order
+    bool made = false; // and successful
 };
 
-// In the new process: hands its calls over to a listener, and waits until there is one.
-void hand_over_calls() {
-    setenv("ASAN_OPTIONS", "detect_leaks=0", 1); // its own calls would be judged as well
-    std::vector<sock_filter> filter = {BPF_STMT(BPF_LD | BPF_W | BPF_ABS, 0)}; // the call's number
-    for (const long call : watched_calls) {
-        filter.push_back(BPF_JUMP(BPF_JMP | BPF_JEQ | BPF_K, static_cast<unsigned>(call), 0, 1));
-        filter.push_back(BPF_STMT(BPF_RET | BPF_K, SECCOMP_RET_USER_NOTIF));
+struct trace : outcome {
+    std::vector<file_call> calls;
+};
+
+// A start-up under strace, which fails or cuts calls as the options say, and its calls for files.
+trace traced(const vorl_device& device, const messages& options = {}) {
+    const std::string log = "/var/calls";
+    // The sanitizers' search for leaks can't run beside strace.
+    messages strace = {"strace", "-DyE", "ASAN_OPTIONS=detect_leaks=0",         "-s999", "-o",
+                       log,      "-e",   "trace=rt_sigaction,%file,%desc,fsync"};
+    strace.insert(strace.end(), options.begin(), options.end());
+    trace result{device.start_up(strace), {}};
+    std::map<std::string, int> counts;
+    std::ifstream lines{log};
+    bool begun = false;
+    for (std::string line; std::getline(lines, line);) {
+        // The start-up's first own act, and no sanitizer's, is to ignore broken pipes.
+        begun = begun || line.starts_with("rt_sigaction(SIGPIPE");
+        const std::string name = line.substr(0, line.find('('));
+        file_call call{name, ++counts[name], std::regex_replace(name, std::regex{"at$|64$"}, ""),
+                       line.find(" = -1 ") == std::string::npos};
+        static const std::regex path{R"raw("(/[^"]*)"|\d<(/[^>]*)>)raw"};
+        const std::string arguments = line.substr(0, line.rfind(" = "));
+        for (std::sregex_iterator next{arguments.begin(), arguments.end(), path}, end; next != end;
+             ++next) {
+            call.text += " " + (*next)[1].str() + (*next)[2].str();
+        }
+        if (begun && call.text.find('/') != std::string::npos && name != "mmap") {
+            result.calls.push_back(call);
+        }
     }
-    filter.push_back(BPF_STMT(BPF_RET | BPF_K, SECCOMP_RET_ALLOW));
-    const sock_fprog program{static_cast<unsigned short>(filter.size()), filter.data()};
-    prctl(PR_SET_NO_NEW_PRIVS, 1, 0, 0, 0);
-    const long listener =
-        syscall(SYS_seccomp, SECCOMP_SET_MODE_FILTER, SECCOMP_FILTER_FLAG_NEW_LISTENER, &program);
-    dup3(static_cast<int>(listener), listener_number, O_CLOEXEC);
-    raise(SIGSTOP);
-}
-
-struct judged_outcome {
-    int status = 0;
-    int calls = 0;
-    std::ptrdiff_t left_open = 0; // descriptors
-};
-
-// One start-up of whose file-system calls each, counted from 0, is made (0), fails with an error
-// number (above 0), or is what a power cut prevents.
-judged_outcome start_up_under(const std::function<int(int)>& judge) {
-    judged_outcome result;
-    const auto attend = [&](int child) {
-        const auto open_descriptors = [child] {
-            const auto folder = "/proc/" + std::to_string(child) + "/fd";
-            return std::distance(std::filesystem::directory_iterator{folder}, {});
-        };
-        waitpid(child, nullptr, WUNTRACED);
-        const long process = syscall(SYS_pidfd_open, child, 0);
-        const auto listener =
-            static_cast<int>(syscall(SYS_pidfd_getfd, process, listener_number, 0));
-        close(static_cast<int>(process));
-        if (listener < 0) {
-            kill(child, SIGKILL);
-            throw std::runtime_error("nobody may listen to the program's calls here");
-        }
-        kill(child, SIGCONT);
-        bool begun = false;
-        pollfd event{listener, POLLIN, 0};
-        while (poll(&event, 1, -1) > 0 && (event.revents & POLLIN) != 0) {
-            seccomp_notif call{};
-            ioctl(listener, SECCOMP_IOCTL_NOTIF_RECV, &call);
-            int sentence = 0;
-            if (call.data.nr == SYS_rt_sigaction) {
-                // The start-up's first own act, and no sanitizer's, is to ignore broken pipes.
-                if (call.data.args[0] == SIGPIPE) {
-                    begun = true;
-                    result.left_open -= open_descriptors();
-                }
-            } else if (call.data.nr == SYS_exit_group) {
-                result.left_open += open_descriptors();
-            } else if (begun) {
-                sentence = judge(result.calls++);
-                // The kernel closes a descriptor even when it reports a failure to do so.
-                result.left_open -= call.data.nr == SYS_close && sentence > 0 ? 1 : 0;
-            }
-            if (sentence == cut_power) {
-                kill(child, SIGKILL);
-                break;
-            }
-            const unsigned flags = sentence == 0 ? SECCOMP_USER_NOTIF_FLAG_CONTINUE : 0U;
-            seccomp_notif_resp response{call.id, 0, -sentence, flags};
-            ioctl(listener, SECCOMP_IOCTL_NOTIF_SEND, &response);
-        }
-        close(listener);
-    };
-    result.status = device::start_up(hand_over_calls, attend).status;
+    std::filesystem::remove(log);
     return result;
 }
 
-const std::string update = "/var/db/timezone/tz/2022a.1.0";
-
-// Has everything to do: an old ICU link to migrate, data to reject, an update to install, a
-// localtime link to correct, leftovers to remove.
-class busy_device : public device {
-public:
-    busy_device() {
-        put({{"tz/2022a.1.0", "dataset icutz44l.dat"},
-             {"tz_latest", "-> " + update},
-             {"zoneinfo", "-> /var/db/timezone/tz/2021a.1.0/zoneinfo"},
-             {"localtime", "-> /usr/share/zoneinfo/Asia/Tokyo"},
-             {"needs_cleanup", "="},
-             {"/var/db/icutz", "-> timezone/tz/2021a.1.0/icutz"},
-             {"/var/db/icu", "="}});
-    }
-};
-
-// The next start-up, on a healthy disk, puts everything right. Returns the ICU link's state.
-std::string icu_link_after_next_start_up() {
-    EXPECT_EQ(device::start_up().status, 0);
-    tree healed = device::contents();
-    EXPECT_EQ(healed["/var/db/timezone/zoneinfo"], "-> " + update + "/zoneinfo");
-    EXPECT_EQ(healed["/var/db/timezone/localtime"].rfind("-> /var/db/timezone/zoneinfo/", 0), 0);
-    EXPECT_FALSE(healed.contains("/var/db/icutz") || healed.contains("/var/db/icu"));
-    return healed["/var/db/timezone/icutz"];
+messages at(const file_call& call, const std::string& fault) {
+    return {"-e", "inject=" + call.name + ":" + fault + ":when=" + std::to_string(call.count)};
 }
 
-TEST(faults, any_failing_call_is_healed) {
-    int calls = 1;
-    for (int failing = 0; failing < calls; ++failing) {
-        for (const int error : {EIO, ENOSPC, EROFS, EACCES, EMFILE, ENOMEM}) {
-            SCOPED_TRACE("call " + std::to_string(failing) + ", error " + std::to_string(error));
-            const busy_device device;
-            const judged_outcome outcome =
-                start_up_under([&](int call) { return call == failing ? error : 0; });
-            EXPECT_LE(outcome.status, 1);
-            EXPECT_EQ(outcome.left_open, 0);
-            EXPECT_EQ(icu_link_after_next_start_up(), "-> " + update + "/icutz");
-            calls = std::max(calls, outcome.calls);
+const std::string area = "/var/db/timezone/";
+const std::string update = area + "tz/2022a.1.0";
+const std::string record = area + "TZVersionDiffRecord";
+const changes old_record = {{record, "= that of the update before"}};
+
+// Something for every phase: an old ICU link to migrate, data to reject, an update to install, a
+// localtime link to correct, leftovers to remove.
+const changes everything_to_do = {{"tz/2022a.1.0", "dataset icutz44l.dat"},
+                                  {"update", "2022a.1.0"},
+                                  {"zoneinfo", "-> /var/db/timezone/tz/2021a.1.0/zoneinfo"},
+                                  {"localtime", "-> /usr/share/zoneinfo/Asia/Tokyo"},
+                                  {"needs_cleanup", "="},
+                                  old_record.front(),
+                                  {"/var/db/icutz", "-> timezone/tz/2021a.1.0/icutz"},
+                                  {"/var/db/icu", "="}};
+
+tree after_start_ups(const changes& found, int number) {
+    const vorl_device device{found};
+    for (int i = 0; i < number; ++i) {
+        EXPECT_EQ(device.start_up().status, 0);
+    }
+    return device.contents();
+}
+
+// What the next start-up need not put right after a failed call is taken as put right: a missing
+// marker, a record that was not written, a zone that could not be read.
+tree settled(tree contents) {
+    contents.erase(area + "needs_cleanup");
+    std::string& text = contents[record]; // an unreadable version is the empty one
+    if (text == "=" || text == old_record.front().second || text == "= .1.0_2022a.1.0") {
+        text = "= 2019c.1.0_2022a.1.0";
+    }
+    if (contents[area + "localtime"] == "-> /var/db/timezone/zoneinfo/America/Los_Angeles") {
+        contents[area + "localtime"] = "-> /var/db/timezone/zoneinfo/Asia/Tokyo";
+    }
+    return contents;
+}
+
+class faults : public testing::TestWithParam<std::string> {};
+
+TEST_P(faults, at_any_call_are_put_right) {
+    const tree expected = settled(after_start_ups(everything_to_do, 2));
+    const trace undisturbed = traced(vorl_device{everything_to_do});
+    for (const file_call& call : undisturbed.calls) {
+        SCOPED_TRACE(call.text);
+        const vorl_device device{everything_to_do};
+        const trace result = traced(device, at(call, "error=" + GetParam()));
+        EXPECT_LE(result.status, 1);
+        int left_open = 0;
+        for (const auto& [name, count, text, made] : result.calls) {
+            left_open += (name == "openat" && made ? 1 : 0) - (name == "close" ? 1 : 0);
+        }
+        EXPECT_EQ(left_open, 0);
+        EXPECT_EQ(device.start_up().status, 0);
+        EXPECT_EQ(settled(device.contents()), expected);
+    }
+    EXPECT_GT(undisturbed.calls.size(), 60);
+    std::cout << undisturbed.calls.size() << " calls failed, one in each start-up\n";
+}
+
+INSTANTIATE_TEST_SUITE_P(error, faults,
+                         testing::Values("EIO", "ENOSPC", "EROFS", "EACCES", "EMFILE", "ENOMEM"),
+                         [](const auto& shown) { return shown.param; });
+
+TEST(faults, interruptions_change_nothing) {
+    const vorl_device whole{everything_to_do};
+    const std::vector<file_call> calls = traced(whole).calls;
+    const messages printed = {"Symlink points at data incompatible with installed system",
+                              "Correcting localtime link to /var/db/timezone/zoneinfo/Asia/Tokyo"};
+    int interrupted = 0;
+    for (const file_call& call : calls) {
+        static const std::regex waiting{"(open|read|getdents|write|fsync) /(var|usr)/.*"};
+        if (std::regex_match(call.text, waiting)) {
+            SCOPED_TRACE(call.text);
+            ++interrupted;
+            const vorl_device device{everything_to_do};
+            EXPECT_EQ(lines_of(traced(device, at(call, "error=EINTR")).printed, printed), printed);
+            EXPECT_EQ(device.contents(), whole.contents());
         }
     }
-    EXPECT_GT(calls, 60);
+    EXPECT_GT(interrupted, 15);
+    std::cout << interrupted << " calls interrupted, one in each start-up\n";
+    // For ever: the start-up gives up, and does not hang.
+    EXPECT_EQ(
+        traced(vorl_device{}, {"-P/usr/share/icu/icutzformat.txt", "-einject=openat:error=EINTR"})
+            .status,
+        0);
 }
 
-TEST(faults, a_power_cut_at_any_call_is_healed) {
-    int cuts = 0;
-    int without_icu_link = 0;
-    for (bool cut = true; cut; ++cuts) {
-        SCOPED_TRACE("power cut before call " + std::to_string(cuts));
-        const busy_device device;
-        const int status =
-            start_up_under([&](int call) { return call == cuts ? cut_power : 0; }).status;
-        cut = status == 128 + SIGKILL;
-        EXPECT_TRUE(cut || status == 0);
-        const std::string icu_link = icu_link_after_next_start_up();
-        without_icu_link += icu_link.empty() ? 1 : 0;
-        EXPECT_TRUE(icu_link.empty() || icu_link == "-> " + update + "/icutz") << icu_link;
+// Once the call is made, a power cut leaves this, which the next start-up doesn't put right.
+using limits = std::vector<std::pair<std::string, changes>>;
+
+void expect_limits(const changes& found, const limits& expected) {
+    const tree put_right = after_start_ups(found, 2);
+    const std::vector<file_call> calls = traced(vorl_device{found}).calls;
+    auto reached = expected.begin();
+    std::string last = "the begin";
+    for (const file_call& call : calls) {
+        SCOPED_TRACE("cut after " + last);
+        const vorl_device device{found};
+        EXPECT_EQ(traced(device, at(call, "signal=KILL")).status, 128 + SIGKILL);
+        EXPECT_EQ(device.start_up().status, 0);
+        EXPECT_EQ(device.contents(), after(put_right, reached->second));
+        last = call.text;
+        if (reached + 1 != expected.end() && last == (reached + 1)->first) {
+            ++reached;
+        }
     }
-    EXPECT_GT(cuts, 60);
-    // After a cut between the two links of an update, the ICU link is missing until the next one:
-    // the system's own ICU files, which have the same schema, are read until then.
-    EXPECT_EQ(without_icu_link, 3);
+    EXPECT_TRUE(reached + 1 == expected.end()) << "never made: " << (reached + 1)->first;
+    EXPECT_TRUE(reached->second.empty());
+    std::cout << "power cut at each of " << calls.size() << " calls\n";
+}
+
+TEST(faults, a_power_cut_on_the_way_from_rejected_data_to_an_update) {
+    expect_limits(
+        everything_to_do,
+        {{"", {{"needs_cleanup", "="}}},
+         {"unlink /var/db/timezone/zoneinfo", {}},
+         {"symlink " + update + "/zoneinfo /var/db/timezone/zoneinfo",
+          {{"icutz", "nothing"}, old_record.front()}},
+         {"symlink " + update + "/icutz /var/db/timezone/icutz", old_record},
+         {"ftruncate " + record, {{record, "="}}},
+         {"write " + record, {}},
+         {"fsync " + record, {}},
+         {"unlink /var/db/timezone/localtime",
+          {{"localtime", "-> /var/db/timezone/zoneinfo/America/Los_Angeles"}}},
+         {"symlink /var/db/timezone/zoneinfo/Asia/Tokyo /var/db/timezone/localtime", {}}});
+}
+
+TEST(faults, a_power_cut_on_the_way_from_one_update_to_the_next) {
+    expect_limits({{"tz/2022a.1.0", "dataset icutz44l.dat"},
+                   {"links", "2020a.1.0"},
+                   {"update", "2022a.1.0"},
+                   old_record.front()},
+                  {{"", {{"needs_cleanup", "="}}},
+                   {"unlink /var/db/timezone/zoneinfo", {{record, "= 2019c.1.0_2022a.1.0"}}},
+                   {"symlink " + update + "/zoneinfo /var/db/timezone/zoneinfo",
+                    {{"icutz", "-> /var/db/timezone/tz/2020a.1.0/icutz"}, old_record.front()}},
+                   {"unlink /var/db/timezone/icutz", {{"icutz", "nothing"}, old_record.front()}},
+                   {"symlink " + update + "/icutz /var/db/timezone/icutz", old_record},
+                   {"ftruncate " + record, {{record, "="}}},
+                   {"write " + record, {}},
+                   {"fsync " + record, {}}});
+}
+
+TEST(faults, nothing_to_do_writes_nothing) {
+    for (const file_call& call : traced(vorl_device{}).calls) {
+        EXPECT_FALSE(call.name == "fsync" || call.name == "write") << call.text;
+    }
+}
+
+TEST(faults, no_memory_for_a_walk_resets_the_links) {
+    const vorl_device device{{{"links", "2020a.1.0"}}};
+    const tree expected = after(device.contents(), {{"links", "system"}});
+    const std::string icu = area + "tz/2020a.1.0/icutz";
+    const std::string reason = "Cannot allocate memory";
+    EXPECT_EQ(traced(device, {"-P" + icu, "-einject=openat:error=ENOMEM"}).printed,
+              "vorl_initialiser: tz_icu::initialize: fts_open of " + icu + " failed, " + reason +
+                  ": " + reason +
+                  "\nvorl_initialiser: Unable to locate data; resetting to system partition: " +
+                  reason + "\n");
+    EXPECT_EQ(device.contents(), expected);
+}
+
+// As when the link comes only after the look at what stands there.
+TEST(faults, the_record_follows_no_link) {
+    const vorl_device device{
+        {{"update", "2020a.1.0"}, {"/var/precious", "= file"}, {record, "-> /var/precious"}}};
+    const tree expected = after(device.contents(), {{"links", "2020a.1.0"}});
+    traced(device, {"-P" + record, "-einject=%%stat:error=ENOENT:when=1"});
+    EXPECT_EQ(device.contents(), expected);
 }
 
 TEST(faults, messages_can_not_harm) {
     const auto contents_after = [](const std::function<void()>& prepare) {
-        const busy_device device;
-        EXPECT_EQ(device::start_up(prepare).status, 0);
-        return device::contents();
+        const vorl_device device{everything_to_do};
+        EXPECT_EQ(device.start_up({}, prepare).status, 0);
+        return device.contents();
     };
-    const tree expected = contents_after([] {});
+    const tree expected = after_start_ups(everything_to_do, 1);
     EXPECT_EQ(contents_after([] { close(2); }), expected);
     EXPECT_EQ(contents_after([] { close(0), close(1), close(2); }), expected);
     EXPECT_EQ(contents_after([] { dup2(open("/dev/full", O_WRONLY), 2); }), expected);
@@ -194,11 +253,21 @@ TEST(faults, messages_can_not_harm) {
               }),
               expected);
     // A limit on the size of files costs the record, not the start-up.
-    const auto limit_files = [] {
-        const rlimit none{0, 0};
-        setrlimit(RLIMIT_FSIZE, &none);
-    };
-    EXPECT_EQ(contents_after(limit_files), after(expected, {{"TZVersionDiffRecord", "="}}));
+    EXPECT_EQ(contents_after([] {
+                  const rlimit none{0, 0};
+                  setrlimit(RLIMIT_FSIZE, &none);
+              }),
+              after(expected, {{record, "="}}));
+    // No file gets the number of a closed standard descriptor. With no other number to be had, none
+    // is opened: nothing is found to be wrong with the data in use.
+    const vorl_device device{{{"links", "2021a.1.0"}}};
+    const tree untouched = device.contents();
+    device.start_up({}, [] {
+        const rlimit three{3, 3};
+        setrlimit(RLIMIT_NOFILE, &three);
+        close(0), close(1), close(2);
+    });
+    EXPECT_EQ(device.contents(), untouched);
 }
 
 } // namespace

@@ -1,9 +1,12 @@
+#include "dataset/dataset.h"
 #include "dataset/icu.h"
 #include "dataset/zoneinfo.h"
 #include "device.h"
 #include "foundation/expression.h"
 #include "foundation/file_system.h"
+#include "foundation/text_file.h"
 #include "foundation/version.h"
+#include "startup/dataset_phase.h"
 
 #include <gtest/gtest.h>
 
@@ -12,7 +15,7 @@
 #include <stdexcept>
 #include <type_traits>
 
-// What a whole start-up can't show.
+// What whole start-ups don't show, or only at length.
 namespace initialiser {
 namespace {
 
@@ -44,7 +47,7 @@ std::string shown(const vorl_version& version) {
 TEST(version, parses_whole_texts_only) {
     for (const auto& [text, parsed] : tree{{"2019c", "2019 c -1 -1"},
                                            {"2020a.1.0", "2020 a 1 0"},
-                                           {"2019c.1", "2019 c 1 -1"},
+                                           {"2019z.1", "2019 z 1 -1"},
                                            {"2016j.12.345", "2016 j 12 345"},
                                            {"02019ab.007", "2019 ab 7 -1"},
                                            {"1c.2147483647", "1 c 2147483647 -1"}}) {
@@ -88,7 +91,8 @@ TEST(expression, matches_long_texts_and_knows_no_classes) {
 }
 
 TEST(file_system, throws_error_numbers) {
-    const device device;
+    const vorl_device device{{{"long", "-> " + std::string(1500, 'x')}}};
+    EXPECT_EQ(read_symlink("/var/db/timezone/long"), std::string(1024, 'x'));
     const std::string tz = "/var/db/timezone/tz";
     testing::internal::CaptureStderr();
     EXPECT_EQ(number_thrown_by([&] { remove(tz); }), EISDIR);
@@ -99,8 +103,68 @@ TEST(file_system, throws_error_numbers) {
     testing::internal::GetCapturedStderr();
 }
 
+TEST(text_file, gives_its_first_word) {
+    vorl_device device;
+    std::map<std::string, std::string> words = {
+        {"", ""}, {"2019c", "2019c"}, {"\b\x0e\x1f\x85\xa0!", "\b\x0e\x1f\x85\xa0!"}};
+    for (const std::string blank : {" ", "\t", "\n", "\v", "\f", "\r"}) {
+        words[blank] = "";
+        words[blank + "2019c" + blank + "46l"] = "2019c";
+    }
+    // Around the size of what is read at once, and far above it.
+    for (const std::size_t length : {65535U, 65536U, 65537U, 300'000U}) {
+        const std::string word(length, 'a');
+        words[word] = word;
+        words[std::string(length, ' ') + word + " b"] = word;
+        words["1" + word.substr(1) + " b"] = "1" + word.substr(1);
+    }
+    for (const auto& [text, word] : words) {
+        device.put({{"text", "= " + text}});
+        EXPECT_TRUE(read_first_word("/var/db/timezone/text") == word)
+            << text.size() << " bytes: " << text.substr(0, 20);
+    }
+}
+
+TEST(dataset, is_named_by_its_path) {
+    const vorl_device device;
+    testing::internal::CaptureStderr();
+    for (const auto& [path, version] : tree{{"", "2019c.1.0"},
+                                            {"/var/db/timezone/tz/2020a.1.0", "2020a.1.0"},
+                                            {"/var/db/timezone/tz/2020a.1.0/", "2020a.1.0/"},
+                                            {"/var/db/timezone/tz/x", "x"}}) {
+        EXPECT_EQ(vorl_dataset{path}.version_text(), version);
+    }
+    for (const std::string path :
+         {"/", "/var/db/timezone/tz/", "/var/db/timezone/tz2/2020b.1.0",
+          "/var/db/timezone/TZ/2020b.1.0", "var/db/timezone/tz/2020b.1.0",
+          "/usr/share/zoneinfo.default", "//var/db/timezone/tz/2020b.1.0"}) {
+        EXPECT_THROW(vorl_dataset{path}, std::invalid_argument) << path;
+    }
+    testing::internal::GetCapturedStderr();
+}
+
+TEST(dataset, is_found_by_the_zoneinfo_link) {
+    for (const auto& [target, path] :
+         tree{{"/usr/share/zoneinfo.default", ""},
+              {"/var/db/timezone/tz/2020a.1.0/zoneinfo", "/var/db/timezone/tz/2020a.1.0"},
+              {"/var/db/timezone/tz/2020a.1.0/", "/var/db/timezone/tz/2020a.1.0"},
+              {"/var/db/timezone/tz/a/b/zoneinfo", "/var/db/timezone/tz/a/b"},
+              {"/var/db/timezone/tz/x/zoneinfo", "/var/db/timezone/tz/x"}}) {
+        EXPECT_EQ(dataset_path_of_zoneinfo_link(target), path);
+    }
+    for (const std::string target :
+         {"", "/", "/usr/share/zoneinfo", "/usr/share/zoneinfo.default/",
+          "/usr/share/zoneinfo.defaults", "/var/db/timezone/tz/2020a.1.0", "/var/db/timezone/tz/",
+          "/var/db/timezone/tz//zoneinfo", "/var/db/timezone/tz", "tz/2020a.1.0/zoneinfo",
+          "/var/db/timezone/TZ/2020a.1.0/zoneinfo"}) {
+        expect_printed({"Bad zoneinfo link " + target}, [&] {
+            EXPECT_EQ(number_thrown_by([&] { dataset_path_of_zoneinfo_link(target); }), -1);
+        });
+    }
+}
+
 TEST(components, are_compatible_by_kind) {
-    const device device;
+    const vorl_device device;
     EXPECT_TRUE(vorl_zoneinfo{}.compatible_schema(vorl_icu{}));
     expect_printed({"vorl_icu::compatible_schema: could not dynamic_cast other component"},
                    [] { EXPECT_FALSE(vorl_icu{}.compatible_schema(vorl_zoneinfo{})); });
