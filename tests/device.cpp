@@ -67,7 +67,6 @@ bool enter_namespace() {
     must(setns(mounts, CLONE_NEWNS) == 0, "no way to the root of the mounts");
     must(mount(nullptr, "/", nullptr, MS_REC | MS_PRIVATE, nullptr) == 0, "no private mounts");
     must(fchdir(root) == 0 && chroot(".") == 0, "no way back");
-    prctl(PR_SET_CHILD_SUBREAPER, 1); // a tracer is waited for as well
     return true;
 }
 
@@ -183,11 +182,9 @@ tree vorl_device::contents(bool stamped) const {
     return all;
 }
 
-outcome vorl_device::start_up(const messages& tracer, const std::function<void()>& prepare) const {
-    std::istringstream emulator{VORL_EMULATOR}; // with its options
-    messages words{std::istream_iterator<std::string>{emulator}, {}};
-    words.insert(words.end(), tracer.begin(), tracer.end());
-    words.push_back("/proc/self/fd/" + std::to_string(program_.number()));
+outcome vorl_device::start_up() const {
+    std::istringstream command{VORL_EMULATOR " " + program()};
+    messages words{std::istream_iterator<std::string>{command}, {}};
     std::vector<char*> arguments;
     for (std::string& word : words) {
         arguments.push_back(word.data());
@@ -200,9 +197,6 @@ outcome vorl_device::start_up(const messages& tracer, const std::function<void()
     if (child == 0) {
         prctl(PR_SET_PDEATHSIG, SIGKILL); // it doesn't outlive a test that is killed
         dup2(log.number(), STDERR_FILENO);
-        if (prepare) {
-            prepare();
-        }
         execvp(arguments.front(), arguments.data());
         _exit(127);
     }
@@ -214,8 +208,6 @@ outcome vorl_device::start_up(const messages& tracer, const std::function<void()
     }
     int status = 0;
     must(waitpid(child, &status, 0) == child, "the program is lost");
-    while (waitpid(-1, nullptr, 0) > 0) {
-    }
     if (hangs) {
         throw std::runtime_error("the program did not end, and was killed");
     }

@@ -2,7 +2,6 @@
 
 #include "foundation/descriptor.h"
 
-#include <functional>
 #include <map>
 #include <string>
 #include <utility>
@@ -35,9 +34,11 @@ public:
     // With `stamped`, a file that was made anew differs from one that was left alone.
     tree contents(bool stamped = false) const;
 
-    // One start-up of the real program, through `tracer` if there is one. `prepare` runs in the new
-    // process before it. A program that doesn't end is killed, and an exception says so.
-    outcome start_up(const messages& tracer = {}, const std::function<void()>& prepare = {}) const;
+    // One start-up of the real program. One that doesn't end is killed, and an exception says so.
+    outcome start_up() const;
+
+    // The program's path.
+    std::string program() const { return "/proc/self/fd/" + std::to_string(program_.number()); }
 
 private:
     vorl_descriptor program_; // opened before something hides it
