@@ -23,7 +23,6 @@ namespace fs = std::filesystem;
 namespace initialiser {
 namespace {
 
-constexpr int timed_out = 124;          // the exit status of "timeout"
 constexpr off_t huge = off_t{3} << 30U; // too large for 32 bits
 constexpr time_t in_2040 = 2208988800;  // too late for 32 bits
 
@@ -59,9 +58,10 @@ bool enter_namespace() {
     // In a chroot "/" is no mount: step out to the namespace's own root, and back in again.
     const int root = open("/", O_PATH | O_CLOEXEC);
     const int mounts = open("/proc/self/ns/mnt", O_RDONLY | O_CLOEXEC);
-    must(setns(mounts, CLONE_NEWNS) == 0, "no way to the root of the mounts");
-    must(mount(nullptr, "/", nullptr, MS_REC | MS_PRIVATE, nullptr) == 0, "no private mounts");
-    must(fchdir(root) == 0 && chroot(".") == 0, "no way back");
+    must(setns(mounts, CLONE_NEWNS) == 0 &&
+             mount(nullptr, "/", nullptr, MS_REC | MS_PRIVATE, nullptr) == 0 && fchdir(root) == 0 &&
+             chroot(".") == 0,
+         "no private mounts");
     return true;
 }
 
@@ -69,21 +69,22 @@ bool enter_namespace() {
 changes in_full(const changes& list) {
     changes all;
     for (const auto& [path, what] : list) {
+        const std::string stored = "-> " + stored_datasets + what;
         const std::string place = path.starts_with('/') ? path : storage_area + path;
         if (path == "update") {
-            all.emplace_back(latest_link, "-> " + stored_datasets + what);
+            all.insert(all.end(), {{latest_link, stored}});
+        } else if (path == "links" && what == "system") {
+            all.insert(all.end(),
+                       {{zoneinfo_link, "-> " + system_zoneinfo}, {icu_link, "nothing"}});
         } else if (path == "links") {
-            const bool stored = what != "system";
-            const std::string dataset = "-> " + stored_datasets + what;
-            all.emplace_back(zoneinfo_link,
-                             stored ? dataset + "/zoneinfo" : "-> " + system_zoneinfo);
-            all.emplace_back(icu_link, stored ? dataset + "/icutz" : "nothing");
+            all.insert(all.end(),
+                       {{zoneinfo_link, stored + "/zoneinfo"}, {icu_link, stored + "/icutz"}});
         } else if (what.starts_with("dataset ")) {
-            all.emplace_back(place + "/zoneinfo/+VERSION", "= an updater's");
-            all.emplace_back(place + "/zoneinfo/Asia/Tokyo", "= TZif");
-            all.emplace_back(place + "/icutz/" + what.substr(8), "= data");
+            all.insert(all.end(), {{place + "/zoneinfo/+VERSION", "= an updater's"},
+                                   {place + "/zoneinfo/Asia/Tokyo", "= TZif"},
+                                   {place + "/icutz/" + what.substr(8), "= data"}});
         } else {
-            all.emplace_back(place, what);
+            all.insert(all.end(), {{place, what}});
         }
     }
     return all;
@@ -114,14 +115,13 @@ void put_one(const fs::path& path, const std::string& what) {
 }
 
 std::string description(const fs::path& path, const struct stat& status) {
-    switch (status.st_mode & S_IFMT) {
-    case S_IFLNK:
+    if (S_ISLNK(status.st_mode)) {
         return "-> " + fs::read_symlink(path).string();
-    case S_IFREG:
-        return status.st_size == 0 ? "=" : "= " + (status.st_size < huge ? read_file(path) : "");
-    default:
-        return S_ISDIR(status.st_mode) ? "directory" : "fifo";
     }
+    if (S_ISREG(status.st_mode)) {
+        return status.st_size == 0 ? "=" : "= " + (status.st_size < huge ? read_file(path) : "");
+    }
+    return S_ISDIR(status.st_mode) ? "directory" : "fifo";
 }
 
 } // namespace
@@ -166,12 +166,9 @@ tree vorl_device::contents(bool stamped) const {
         for (const auto& entry : fs::recursive_directory_iterator{path}) {
             struct stat status {}; // the library's own knows no huge or late file on 32 bits
             must(lstat(entry.path().c_str(), &status) == 0, entry.path());
-            all[entry.path()] = description(entry.path(), status);
-            if (stamped) {
-                all[entry.path()] += " " + std::to_string(status.st_ino) + " " +
-                                     std::to_string(status.st_ctim.tv_sec) + "." +
-                                     std::to_string(status.st_ctim.tv_nsec);
-            }
+            const auto stamp =
+                std::to_string(status.st_ino) + " " + std::to_string(status.st_ctim.tv_nsec);
+            all[entry.path()] = description(entry.path(), status) + (stamped ? stamp : "");
         }
     }
     return all;
@@ -181,13 +178,13 @@ outcome vorl_device::start_up() const {
     const std::string command =
         "timeout --kill-after=1 20 " VORL_EMULATOR " " + program() + " 2>&1 >/dev/null";
     FILE* const output = popen(command.c_str(), "re");
-    must(output != nullptr, "no process for the program");
+    must(output != nullptr, "no process");
     std::string printed;
     for (int byte = fgetc(output); byte != EOF; byte = fgetc(output)) {
         printed += static_cast<char>(byte);
     }
     const int status = pclose(output);
-    if (WIFEXITED(status) && WEXITSTATUS(status) == timed_out) {
+    if (WIFEXITED(status) && WEXITSTATUS(status) == 124) { // timeout's own
         throw std::runtime_error("the program did not end, and was killed");
     }
     return {WIFSIGNALED(status) ? 128 + WTERMSIG(status) : WEXITSTATUS(status), printed};
@@ -201,13 +198,13 @@ tree after(tree contents, const changes& list) {
     return contents;
 }
 
-messages lines_of(const std::string& printed, const messages& expected,
-                  const std::string& program) {
+messages lines_of(const std::string& printed, const messages& expected) {
+    const std::string program = "vorl_initialiser: ";
     messages lines;
     std::istringstream stream{printed};
     for (std::string line; std::getline(stream, line); lines.push_back(line)) {
-        if (line.starts_with(program + ": ")) {
-            line.erase(0, program.size() + 2);
+        if (line.starts_with(program)) {
+            line.erase(0, program.size());
         }
         const std::string wanted = lines.size() < expected.size() ? expected[lines.size()] : "";
         if (line.starts_with(wanted + ": ") && line.rfind(": ") == wanted.size()) {

@@ -26,8 +26,6 @@ public:
     // Throws where neither root nor a namespace can be had: a test never passes unrun.
     explicit vorl_device(const changes& found = {});
     ~vorl_device();
-    vorl_device(const vorl_device&) = delete;
-    vorl_device& operator=(const vorl_device&) = delete;
 
     void put(const changes& list);
 
@@ -48,9 +46,8 @@ private:
 // `contents` after the changes of `list`.
 tree after(tree contents, const changes& list);
 
-// The lines of what a program of the name `program` printed. The name is left out; so is the error
-// text where the line expected in the same place has none.
-messages lines_of(const std::string& printed, const messages& expected,
-                  const std::string& program = "vorl_initialiser");
+// The lines that were printed, without the program's name; each also without its error text where
+// the line expected in its place has none.
+messages lines_of(const std::string& printed, const messages& expected);
 
 } // namespace initialiser

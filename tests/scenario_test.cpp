@@ -2,8 +2,10 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <filesystem>
 #include <fstream>
+#include <iterator>
 #include <ostream>
 #include <sstream>
 #include <stdexcept>
@@ -23,49 +25,46 @@ void PrintTo(const scenario& shown, std::ostream* out) {
     *out << shown.name;
 }
 
-void add_line(std::vector<scenario>& all, const std::string& line) {
+// False where the line can't be understood.
+bool add_line(std::vector<scenario>& all, const std::string& line) {
     std::istringstream words{line};
     std::string keyword;
-    std::string rest;
-    words >> keyword >> std::ws;
-    if (keyword.empty() || keyword == "#") {
-        return;
+    std::string path;
+    const auto rest = [&words] {
+        std::string text;
+        std::getline(words >> std::ws, text);
+        return text;
+    };
+    if (!(words >> keyword) || keyword == "#") {
+        return true;
     }
     if (keyword == "scenario") {
-        std::getline(words, rest);
-        all.push_back({rest, {}, {}, {}});
-        return;
-    }
-    scenario& last = all.at(all.size() - 1); // throws when there is none
-    if (keyword == "found" || keyword == "leaves") {
-        std::string path;
-        words >> path >> std::ws;
-        std::getline(words, rest);
-        (keyword == "found" ? last.found : last.left).emplace_back(path, rest);
+        all.push_back({rest(), {}, {}, {}});
+    } else if (all.empty()) {
+        return false;
+    } else if (keyword == "found" && words >> path) {
+        all.back().found.emplace_back(path, rest());
+    } else if (keyword == "leaves" && words >> path) {
+        all.back().left.emplace_back(path, rest());
     } else if (keyword == "prints") {
-        std::getline(words, rest);
-        last.printed.push_back(rest);
-    } else if (keyword == "exits") {
-        words >> last.status;
+        all.back().printed.push_back(rest());
     } else {
-        throw std::invalid_argument("no such keyword");
+        return keyword == "exits" && words >> all.back().status;
     }
+    return true;
 }
 
-// The scenarios of one file. Throws where it holds none or a line can't be understood.
 std::vector<scenario> scenarios_in(const std::filesystem::path& path) {
     std::vector<scenario> all;
     std::ifstream file{path};
     for (std::string line; std::getline(file, line);) {
         line.erase(line.find_last_not_of(" \t\r") + 1);
-        try {
-            add_line(all, line);
-        } catch (const std::exception& error) {
-            throw std::runtime_error(path.string() + ": " + line + ": " + error.what());
+        if (!add_line(all, line)) {
+            throw std::runtime_error(path.string() + ": what is this? " + line);
         }
     }
     if (all.empty()) {
-        throw std::runtime_error(path.string() + ": there is no scenario, or it can't be read");
+        throw std::runtime_error(path.string() + " holds no scenario, or can't be read");
     }
     return all;
 }
@@ -75,8 +74,7 @@ std::vector<scenario> scenarios() {
     for (const auto& entry : std::filesystem::directory_iterator{VORL_SCENARIOS}) {
         const std::string name = entry.path().filename();
         if (name != "README.md" && !name.starts_with('.')) {
-            const std::vector<scenario> more = scenarios_in(entry.path());
-            all.insert(all.end(), more.begin(), more.end());
+            std::ranges::move(scenarios_in(entry.path()), std::back_inserter(all));
         }
     }
     return all;

@@ -23,11 +23,11 @@ namespace {
 static_assert(!std::is_destructible_v<vorl_dataset_component>);
 
 void expect_printed(const messages& expected, const std::function<void()>& action) {
+    static char program_name[] = "vorl_initialiser";
+    program_invocation_short_name = program_name;
     testing::internal::CaptureStderr();
     action();
-    EXPECT_EQ(
-        lines_of(testing::internal::GetCapturedStderr(), expected, program_invocation_short_name),
-        expected);
+    EXPECT_EQ(lines_of(testing::internal::GetCapturedStderr(), expected), expected);
 }
 
 int number_thrown_by(const std::function<void()>& action) {
@@ -51,8 +51,7 @@ TEST(version, parses_whole_texts_only) {
                                            {"2016j.12.345", "2016 j 12 345"},
                                            {"02019ab.007", "2019 ab 7 -1"},
                                            {"1c.2147483647", "1 c 2147483647 -1"}}) {
-        expect_printed(
-            {}, [&parsed = parsed, &text = text] { EXPECT_EQ(shown(vorl_version{text}), parsed); });
+        EXPECT_EQ(shown(vorl_version{text}), parsed);
     }
     for (const std::string text : {"2019C", "2019", "2019c.", "2019c.1.0.2", "", "v2019c", " 2019c",
                                    "2019c ", "2019c.1.0/", "2019\xe4"}) {
@@ -105,18 +104,17 @@ TEST(file_system, throws_error_numbers) {
 
 TEST(text_file, gives_its_first_word) {
     vorl_device device;
-    std::map<std::string, std::string> words = {
-        {"", ""}, {"2019c", "2019c"}, {"\b\x0e\x1f\x85\xa0!", "\b\x0e\x1f\x85\xa0!"}};
+    tree words = {{"", ""}, {"\b\x0e\x1f\x85\xa0!", "\b\x0e\x1f\x85\xa0!"}};
     for (const std::string blank : {" ", "\t", "\n", "\v", "\f", "\r"}) {
         words[blank] = "";
         words[blank + "2019c" + blank + "46l"] = "2019c";
     }
     // Around the size of what is read at once, and far above it.
     for (const std::size_t length : {65535U, 65536U, 65537U, 300'000U}) {
-        const std::string word(length, 'a');
+        const std::string word = std::string(length - 1, 'a') + "z";
         words[word] = word;
+        words[word + " b"] = word;
         words[std::string(length, ' ') + word + " b"] = word;
-        words["1" + word.substr(1) + " b"] = "1" + word.substr(1);
     }
     for (const auto& [text, word] : words) {
         device.put({{"text", "= " + text}});
@@ -135,9 +133,8 @@ TEST(dataset, is_named_by_its_path) {
         EXPECT_EQ(vorl_dataset{path}.version_text(), version);
     }
     for (const std::string path :
-         {"/", "/var/db/timezone/tz/", "/var/db/timezone/tz2/2020b.1.0",
-          "/var/db/timezone/TZ/2020b.1.0", "var/db/timezone/tz/2020b.1.0",
-          "/usr/share/zoneinfo.default", "//var/db/timezone/tz/2020b.1.0"}) {
+         {"/", "/var/db/timezone/tz/", "/var/db/timezone/tz2/x", "/var/db/timezone/TZ/x",
+          "var/db/timezone/tz/x", "//var/db/timezone/tz/x", "/usr/share/zoneinfo.default"}) {
         EXPECT_THROW(vorl_dataset{path}, std::invalid_argument) << path;
     }
     testing::internal::GetCapturedStderr();
@@ -153,10 +150,9 @@ TEST(dataset, is_found_by_the_zoneinfo_link) {
         EXPECT_EQ(dataset_path_of_zoneinfo_link(target), path);
     }
     for (const std::string target :
-         {"", "/", "/usr/share/zoneinfo", "/usr/share/zoneinfo.default/",
-          "/usr/share/zoneinfo.defaults", "/var/db/timezone/tz/2020a.1.0", "/var/db/timezone/tz/",
-          "/var/db/timezone/tz//zoneinfo", "/var/db/timezone/tz", "tz/2020a.1.0/zoneinfo",
-          "/var/db/timezone/TZ/2020a.1.0/zoneinfo"}) {
+         {"", "/", "/usr/share/zoneinfo", "/usr/share/zoneinfo.default/", "tz/x/zoneinfo",
+          "/usr/share/zoneinfo.defaults", "/var/db/timezone/tz", "/var/db/timezone/tz/",
+          "/var/db/timezone/tz/x", "/var/db/timezone/tz//x", "/var/db/timezone/TZ/x/zoneinfo"}) {
         expect_printed({"Bad zoneinfo link " + target}, [&] {
             EXPECT_EQ(number_thrown_by([&] { dataset_path_of_zoneinfo_link(target); }), -1);
         });
