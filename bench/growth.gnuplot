@@ -4,11 +4,11 @@ set multiplot layout 2,1
 set logscale xy
 set format xy "%.0s%c"
 set key left top
-do for [offset=0:1] {
-    set title offset ? "system calls" : "instructions"
-    set yrange [(offset ? 10 : 1e5):(offset ? 1e4 : 1e9)]
-    plot "growth" using 1:(column(6 + offset)) with linespoints title "ICU files, no schema in them", \
-         "" using 1:(column(4 + offset)) with linespoints title "files below an icutz directory", \
-         "" using 1:(column(2 + offset)) with linespoints title "stored data sets"
+do for [which=0:1] {
+    set title which ? "system calls" : "instructions"
+    set yrange [(which ? 10 : 1e5):(which ? 1e4 : 1e9)]
+    plot "growth" using 1:(column(6 + which)) with linespoints title "ICU files, no schema in them", \
+         "" using 1:(column(4 + which)) with linespoints title "files below an icutz directory", \
+         "" using 1:(column(2 + which)) with linespoints title "stored data sets"
 }
 unset multiplot
