@@ -84,7 +84,7 @@ row() { # WHAT AIM COMMAND...: what the command prints for the two kinds of star
     local nothing update
     nothing=$("${@:3}" nothing)
     update=$("${@:3}" update)
-    printf '  %-40s %-17s %-17s %s\n' "$1" "$nothing" "$update" "$2"
+    printf '  %-38s %-20s %-20s %s\n' "$1" "$nothing" "$update" "$2"
 }
 
 rows_of_times() {
@@ -105,7 +105,7 @@ grow() { # KIND PATHS...: what the start-up costs with more and more of these fi
 }
 
 [[ $(start_up update ./start_up.sh) == *2020a.1.0_2020b.1.0 ]] || fail "the script installs no update"
-printf '\n%-42s %-17s %-17s %s\n' 'What a start-up costs' 'nothing to do' 'an update' aim
+printf '\n%-40s %-20s %-20s %s\n' 'What a start-up costs' 'nothing to do' 'an update' aim
 printf '  on disk (%s)\n' "$(stat -f -c %T .)"
 rows_of_times
 printf '  in memory, waiting for no disk\n'
