@@ -13,10 +13,6 @@
 namespace initialiser {
 namespace {
 
-// Far above what any real data need (a version word of 20 million bytes still fits), and far below
-// what the rest of the system would miss.
-constexpr rlim_t memory_bound = rlim_t{256} << 20U;
-
 // Fills the closed ones of descriptors 0 to 2 with one that can neither be read nor written. The
 // root directory serves since a bare root has no /dev/null.
 void occupy_standard_descriptors() noexcept {
@@ -31,6 +27,9 @@ void occupy_standard_descriptors() noexcept {
 
 void bound_memory() noexcept {
 #ifndef VORL_MEMORY_UNBOUNDED
+    // Far above what any real data need (a version word of 20 million bytes still fits), and far
+    // below what the rest of the system would miss.
+    constexpr rlim_t memory_bound = rlim_t{256} << 20U;
     rlimit data{};
     if (::getrlimit(RLIMIT_DATA, &data) == 0) {
         data.rlim_cur = std::min(data.rlim_cur, memory_bound);
