@@ -69,7 +69,7 @@ bool enter_namespace() {
 changes in_full(const changes& list) {
     changes all;
     for (const auto& [path, what] : list) {
-        const std::string stored = "-> " + stored_datasets + what;
+        const std::string stored = std::string{"-> "}.append(stored_datasets).append(what);
         const std::string place = path.starts_with('/') ? path : storage_area + path;
         if (path == "update") {
             all.insert(all.end(), {{latest_link, stored}});

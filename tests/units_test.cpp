@@ -105,9 +105,9 @@ TEST(file_system, throws_error_numbers) {
 TEST(text_file, gives_its_first_word) {
     vorl_device device;
     tree words = {{"", ""}, {"\b\x0e\x1f\x85\xa0!", "\b\x0e\x1f\x85\xa0!"}};
-    for (const std::string blank : {" ", "\t", "\n", "\v", "\f", "\r"}) {
-        words[blank] = "";
-        words[blank + "2019c" + blank + "46l"] = "2019c";
+    for (const char blank : {' ', '\t', '\n', '\v', '\f', '\r'}) {
+        words[{blank}] = "";
+        words[{blank, 'a', blank, 'b'}] = "a";
     }
     // Around the size of what is read at once, and far above it.
     for (const std::size_t length : {65535U, 65536U, 65537U, 300'000U}) {
