@@ -33,9 +33,7 @@ void must(bool done, const std::string& what) {
 }
 
 void write_file(const fs::path& path, const std::string& text) {
-    std::ofstream file{path};
-    file << text;
-    must(file.flush().good(), path);
+    must((std::ofstream{path} << text).flush().good(), path);
 }
 
 std::string read_file(const fs::path& path) {
@@ -47,13 +45,12 @@ std::string read_file(const fs::path& path) {
 // Root makes a mount namespace. Anybody else needs a user namespace around it, where the kernel
 // allows that.
 bool enter_namespace() {
-    const std::string user = std::to_string(geteuid());
-    const std::string group = std::to_string(getegid());
+    const std::string ids[] = {std::to_string(geteuid()), std::to_string(getegid())};
     if (unshare(CLONE_NEWNS) != 0) {
         must(unshare(CLONE_NEWNS | CLONE_NEWUSER) == 0, "no namespace for a private device");
         write_file("/proc/self/setgroups", "deny");
-        write_file("/proc/self/uid_map", "0 " + user + " 1");
-        write_file("/proc/self/gid_map", "0 " + group + " 1");
+        write_file("/proc/self/uid_map", "0 " + ids[0] + " 1");
+        write_file("/proc/self/gid_map", "0 " + ids[1] + " 1");
     }
     // In a chroot "/" is no mount: step out to the namespace's own root, and back in again.
     const int root = open("/", O_PATH | O_CLOEXEC);
