@@ -6,7 +6,6 @@
 #include <filesystem>
 #include <fstream>
 #include <iterator>
-#include <ostream>
 #include <sstream>
 #include <stdexcept>
 
@@ -20,10 +19,6 @@ struct scenario {
     changes left;
     int status = 0;
 };
-
-void PrintTo(const scenario& shown, std::ostream* out) {
-    *out << shown.name;
-}
 
 // False where the line can't be understood.
 bool add_line(std::vector<scenario>& all, const std::string& line) {
