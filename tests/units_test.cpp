@@ -11,7 +11,6 @@
 #include <gtest/gtest.h>
 
 #include <cerrno>
-#include <regex>
 #include <stdexcept>
 #include <type_traits>
 
@@ -28,13 +27,6 @@ void expect_printed(const messages& expected, const std::function<void()>& actio
     testing::internal::CaptureStderr();
     action();
     EXPECT_EQ(lines_of(testing::internal::GetCapturedStderr(), expected), expected);
-}
-
-int number_thrown_by(const std::function<void()>& action) try {
-    action();
-    return 0;
-} catch (const int number) {
-    return number;
 }
 
 std::string shown(const vorl_version& version) {
@@ -79,25 +71,16 @@ TEST(version, is_strictly_and_totally_ordered) {
     }
 }
 
-TEST(expression, matches_long_texts_and_knows_no_classes) {
+TEST(expression, matches_long_texts) {
     constexpr std::size_t length = 200'000;
     const vorl_expression expression{"([0-9]+)([a-z]+)"};
     EXPECT_EQ(expression.match_whole("1" + std::string(length, 'a'))[2].size(), length);
     EXPECT_TRUE(expression.match_whole(std::string(length, '1')).empty());
-    EXPECT_THROW(vorl_expression{R"(\d+)"}, std::regex_error);
 }
 
-TEST(file_system, throws_error_numbers) {
+TEST(file_system, cuts_long_targets) {
     const vorl_device device{{{"long", "-> " + std::string(1500, 'x')}}};
     EXPECT_EQ(read_symlink("/var/db/timezone/long"), std::string(1024, 'x'));
-    const std::string tz = "/var/db/timezone/tz";
-    testing::internal::CaptureStderr();
-    EXPECT_EQ(number_thrown_by([&] { remove(tz); }), EISDIR);
-    EXPECT_EQ(number_thrown_by([&] { read_symlink(tz); }), EINVAL);
-    EXPECT_EQ(number_thrown_by([&] { create_symlink("target", tz); }), EEXIST);
-    EXPECT_EQ(number_thrown_by([&] { create_symlink("target", tz + "/none/link"); }), ENOENT);
-    EXPECT_EQ(number_thrown_by([&] { remove(tz + "/none"), read_symlink(tz + "/none"); }), 0);
-    testing::internal::GetCapturedStderr();
 }
 
 TEST(text_file, gives_its_first_word) {
@@ -146,9 +129,8 @@ TEST(dataset, is_found_by_the_zoneinfo_link) {
          {"", "/", "/usr/share/zoneinfo", "/usr/share/zoneinfo.default/", "tz/x/zoneinfo",
           "/usr/share/zoneinfo.defaults", "/var/db/timezone/tz", "/var/db/timezone/tz/",
           "/var/db/timezone/tz/x", "/var/db/timezone/tz//x", "/var/db/timezone/TZ/x/zoneinfo"}) {
-        expect_printed({"Bad zoneinfo link " + target}, [&] {
-            EXPECT_EQ(number_thrown_by([&] { dataset_path_of_zoneinfo_link(target); }), -1);
-        });
+        expect_printed({"Bad zoneinfo link " + target},
+                       [&] { EXPECT_THROW(dataset_path_of_zoneinfo_link(target), int); });
     }
 }
 
