@@ -105,7 +105,7 @@ void put_one(const fs::path& path, const std::string& what) {
         fs::create_symlink(what.substr(3), path);
     } else if (what == "=" || what == "private" || what.starts_with("= ")) {
         write_file(path, what.starts_with("= ") ? what.substr(2) : "");
-        fs::permissions(path, fs::perms{what == "private" ? 0600U : 0644U});
+        fs::permissions(path, fs::perms{what == "private" ? 0640U : 0644U});
     } else if (what != "nothing") {
         throw std::invalid_argument("no such thing: " + what);
     }
@@ -116,7 +116,8 @@ std::string description(const fs::path& path, const struct stat& status) {
         return "-> " + fs::read_symlink(path).string();
     }
     if (S_ISREG(status.st_mode)) {
-        return status.st_size == 0 ? "=" : "= " + (status.st_size < huge ? read_file(path) : "");
+        const std::string held = status.st_size < huge ? read_file(path) : "";
+        return (status.st_mode & S_IROTH) == 0 ? "private" : status.st_size == 0 ? "=" : "= " + held;
     }
     return S_ISDIR(status.st_mode) ? "directory" : "fifo";
 }
