@@ -14,8 +14,8 @@
 namespace initialiser {
 
 // A walk over the entries of one directory, in the order in which the file system yields them. It
-// reads no further than it is asked to and never looks below the directory, so that neither a huge
-// directory nor a deep one costs more than what stands before the entry sought.
+// reads no further than it is asked to and never looks below the directory, so it costs no more
+// than the entries before the one sought.
 class vorl_directory_walk {
 public:
     // Opens the walk; `path` itself may be a link. A missing directory is no error, nor is one that

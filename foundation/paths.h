@@ -13,7 +13,8 @@ inline const std::string stored_datasets = "/var/db/timezone/tz/"; // a director
 inline const std::string zoneinfo_link = "/var/db/timezone/zoneinfo";
 inline const std::string icu_link = "/var/db/timezone/icutz"; // absent: the system's own ICU files
 inline const std::string localtime_link = "/var/db/timezone/localtime";
-inline const std::string latest_link = "/var/db/timezone/tz_latest"; // the update on offer
+inline const std::string latest_link =
+    "/var/db/timezone/tz_latest"; // the updater names an update by it
 
 // What a start-up leaves for the programs that clean up and report.
 inline const std::string cleanup_marker = "/var/db/timezone/needs_cleanup";

@@ -12,7 +12,7 @@
 namespace initialiser {
 namespace {
 
-constexpr std::size_t block_size = 65536;
+constexpr std::size_t block_size = 16384;
 constexpr mode_t new_file_mode = 0666; // less the process's mask
 
 // Opens the regular file at `path`, without following a link there when the flags say so. Gives a

@@ -2,9 +2,9 @@
 
 #include <string>
 
-// Small text files. Neither operation waits, prints, or reads or writes anything but a regular
-// file, whatever stands at the path and even when it is exchanged meanwhile. A device that stands
-// there is not opened either, unless it takes a file's place in the instant before the open.
+// Small text files. Neither operation prints, or waits for another program. Only a regular file is
+// read or written, even when something else takes its place meanwhile. A device is not even opened,
+// unless it takes a file's place in the instant before the open.
 namespace initialiser {
 
 // The first word of the file at `path`, links followed: leading white space is skipped, and the

@@ -116,8 +116,10 @@ std::string description(const fs::path& path, const struct stat& status) {
         return "-> " + fs::read_symlink(path).string();
     }
     if (S_ISREG(status.st_mode)) {
-        const std::string held = status.st_size < huge ? read_file(path) : "";
-        return (status.st_mode & S_IROTH) == 0 ? "private" : status.st_size == 0 ? "=" : "= " + held;
+        if ((status.st_mode & S_IROTH) == 0) {
+            return "private";
+        }
+        return status.st_size == 0 ? "=" : "= " + (status.st_size < huge ? read_file(path) : "");
     }
     return S_ISDIR(status.st_mode) ? "directory" : "fifo";
 }
@@ -174,7 +176,7 @@ tree vorl_device::contents(bool stamped) const {
 
 outcome vorl_device::start_up() const {
     const std::string command =
-        "timeout --kill-after=1 20 " VORL_EMULATOR " " + program() + " 2>&1 >/dev/null";
+        "timeout --kill-after=1 10 " VORL_EMULATOR " " + program() + " 2>&1 >/dev/null";
     FILE* const output = popen(command.c_str(), "re");
     must(output != nullptr, "no process");
     std::string printed;

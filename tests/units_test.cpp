@@ -91,7 +91,7 @@ TEST(text_file, gives_its_first_word) {
         words[{blank, 'a', blank, 'b'}] = "a";
     }
     // Around the size of what is read at once, and far above it.
-    for (const std::size_t length : {65535U, 65536U, 65537U, 300'000U}) {
+    for (const std::size_t length : {16383U, 16384U, 16385U, 300'000U}) {
         const std::string word = std::string(length - 1, 'a') + "z";
         words[word] = word;
         words[word + " b"] = word;
