@@ -4,8 +4,8 @@
 set -euo pipefail
 shopt -s inherit_errexit
 script=scripts/bench
-# shellcheck source=scripts/common
-source ./common
+# shellcheck source=scripts/workshop
+source ./workshop
 
 # In a chroot the mounts can't be made private: then none may be left behind.
 mount --make-rprivate / 2>/dev/null || trap 'umount -l /usr/share /var' EXIT
