@@ -22,11 +22,10 @@ public:
     vorl_dataset_component& operator=(const vorl_dataset_component&) = delete;
 
 protected:
-    vorl_dataset_component() = default;
-    explicit vorl_dataset_component(std::string path) : dataset_path_(std::move(path)) {}
+    explicit vorl_dataset_component(std::string path = {}) : dataset_path_(std::move(path)) {}
 
-    // Neither virtual nor public: the shared pointer that was made for a component's own kind
-    // destroys it as that kind.
+    // Not virtual: a component is never destroyed through this class. The shared pointer that was
+    // made for a vorl_zoneinfo or a vorl_icu calls the destructor of that class.
     ~vorl_dataset_component() = default;
 
     // The data set's directory, as it was given; empty for the system data set.

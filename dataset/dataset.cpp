@@ -13,7 +13,8 @@
 namespace initialiser {
 namespace {
 
-// The system's tz database names its tz release only. Its data count as the first of that release.
+// The system's tz database names only its tz release. This makes it a version: that of the first
+// data set with that release.
 constexpr auto system_version_suffix = ".1.0";
 
 bool is_among_stored_datasets(const std::string& path) {
@@ -21,8 +22,6 @@ bool is_among_stored_datasets(const std::string& path) {
 }
 
 } // namespace
-
-vorl_dataset::vorl_dataset() : vorl_dataset(std::string{}) {}
 
 vorl_dataset::vorl_dataset(std::string path) : path_(std::move(path)) {
     create_components();
@@ -44,8 +43,8 @@ void vorl_dataset::create_components() {
 }
 
 bool vorl_dataset::compatible_with(const vorl_dataset& other) const {
-    return std::equal(
-        components_.begin(), components_.end(), other.components_.begin(), other.components_.end(),
+    return std::ranges::equal(
+        components_, other.components_,
         [](const auto& own, const auto& others) { return own->compatible_schema(*others); });
 }
 

@@ -14,12 +14,11 @@ namespace initialiser {
 // text. A data set is complete when it is built, never changes and is never copied.
 class vorl_dataset {
 public:
-    // Builds the system data set, or the one at `path`. For a path that is neither empty nor below
-    // the directory of the stored data sets, prints "vorl_dataset::create_components: bad path
-    // PATH" and throws std::invalid_argument ("badpath"). Prints and throws what building the
+    // Builds the data set at `path`, or the system data set. For a path that is neither empty nor
+    // below the directory of the stored data sets, prints "vorl_dataset::create_components: bad
+    // path PATH" and throws std::invalid_argument ("badpath"). Prints and throws what building the
     // version and the components does.
-    vorl_dataset();
-    explicit vorl_dataset(std::string path);
+    explicit vorl_dataset(std::string path = {});
     vorl_dataset(const vorl_dataset&) = delete;
     vorl_dataset& operator=(const vorl_dataset&) = delete;
 

@@ -15,13 +15,11 @@
 namespace initialiser {
 namespace {
 
-// Names that tell the schema: digits, then the byte order and character set of the files: l, b or
-// e.
+// Names that tell the schema: digits and one letter, which stands for the byte order and character
+// set of the files.
 constexpr auto icu_file_expression = R"(icutz([0-9]+[lbe])\.dat)";
 
 } // namespace
-
-vorl_icu::vorl_icu() : vorl_icu(std::string{}) {}
 
 vorl_icu::vorl_icu(const std::string& path)
     : vorl_dataset_component(path),
@@ -43,8 +41,8 @@ void vorl_icu::initialize() {
 void vorl_icu::find_schema_of_files() {
     const vorl_expression expression{icu_file_expression};
     vorl_directory_walk walk{icu_path_};
-    if (walk.out_of_memory()) {
-        const int error = errno;
+    if (const int error = walk.opening_error(); error != 0) {
+        errno = error;
         // Other programs look for this text: its names stay as they are.
         warn("tz_icu::initialize: fts_open of %s failed, %s", icu_path_.c_str(), strerror(error));
         throw error;

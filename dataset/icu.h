@@ -10,14 +10,13 @@ namespace initialiser {
 // can be used with the installed system.
 class vorl_icu final : public vorl_dataset_component {
 public:
-    // Finds the schema of the ICU files of the data set at `path`, or without a path of the system.
-    // None is no error: the schema is then empty, and for a stored data set "No ICU schema found
-    // for PATH" is printed. Without memory to walk the directory, prints "tz_icu::initialize:
+    // Finds the schema of the ICU files of the data set at `path`; the empty path is the system
+    // data set. When there is no schema, it is empty, and for a stored data set "No ICU schema
+    // found for PATH" is printed. Without memory to walk the directory, prints "tz_icu::initialize:
     // fts_open of DIRECTORY failed, REASON" and throws the error number.
-    vorl_icu();
-    explicit vorl_icu(const std::string& path);
+    explicit vorl_icu(const std::string& path = {});
 
-    // True when both schemas are the same text; two empty ones are. For a component of another
+    // True when both schemas are the same text, the empty one included. For a component of another
     // kind, prints "vorl_icu::compatible_schema: could not dynamic_cast other component" and
     // returns false.
     bool compatible_schema(const vorl_dataset_component& other) const override;

@@ -8,8 +8,6 @@
 
 namespace initialiser {
 
-vorl_zoneinfo::vorl_zoneinfo() : vorl_zoneinfo(std::string{}) {}
-
 vorl_zoneinfo::vorl_zoneinfo(const std::string& path)
     : vorl_dataset_component(path),
       zoneinfo_path_(path.empty() ? system_zoneinfo : path + "/" + zoneinfo_directory) {

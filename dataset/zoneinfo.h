@@ -9,10 +9,10 @@ namespace initialiser {
 // A data set's compiled tz database: a directory of zone files with a "+VERSION" file at its top.
 class vorl_zoneinfo final : public vorl_dataset_component {
 public:
-    // Finds the database of the data set at `path`, or without a path the system's, and reads its
-    // version. A missing or unreadable database is no error.
-    vorl_zoneinfo();
-    explicit vorl_zoneinfo(const std::string& path);
+    // Finds the database of the data set at `path` and reads its version; the empty path is the
+    // system data set. A missing or unreadable database has the empty version. Throws
+    // no_error_number when the version is too long (see read_first_word).
+    explicit vorl_zoneinfo(const std::string& path = {});
 
     // Always true: compiled zone files have one format.
     bool compatible_schema(const vorl_dataset_component& other) const override;

@@ -1,7 +1,5 @@
 #pragma once
 
-#include "foundation/descriptor.h"
-
 #include <fcntl.h>
 #include <sys/types.h>
 
@@ -19,22 +17,18 @@ inline constexpr int always_readable = 4;
 inline constexpr int set_class_command = 64;
 
 // Applies a data-protection command to an open directory. Here it changes nothing and returns -1.
-// It leaves the error number alone, which would show up behind the next message. The kernel is not
-// asked: to it, the command's number may one day mean something else.
+// It makes no system call, since Linux may one day give the command's number another meaning. It
+// leaves the error number alone, which would show up behind the next message.
 inline int control_protection(int /*descriptor*/, int /*command*/,
                               int /*protection_class*/) noexcept {
     return -1;
 }
 
 // Opens `path`, and creates it in a protection class when the flags say so. Returns the descriptor,
-// or -1 with the error number set. Here it is an ordinary open without a class. It does not follow
-// a link at `path`, since a planted link could make a file anywhere, and does not wait for a FIFO's
-// reader.
+// or -1 with the error number set. Here it is an ordinary open without a class.
 inline int open_protected(const std::string& path, int flags, int /*protection_class*/,
                           int /*option_flags*/, mode_t mode) noexcept {
-    return repeat_interrupted([&] {
-        return ::open(path.c_str(), flags | O_NOFOLLOW | O_NONBLOCK | O_NOCTTY | O_CLOEXEC, mode);
-    });
+    return ::open(path.c_str(), flags, mode);
 }
 
 } // namespace initialiser

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "foundation/descriptor.h"
+#include "foundation/repeat_interrupted.h"
 
 #include <dirent.h>
 #include <fcntl.h>
@@ -22,10 +22,10 @@ public:
     // can't be read or isn't a directory: the walk then has no entries.
     explicit vorl_directory_walk(const std::string& path)
         : directory_(repeat_interrupted([&] { return ::opendir(path.c_str()); })),
-          out_of_memory_(directory_ == nullptr && errno == ENOMEM) {}
+          opening_error_(directory_ == nullptr && errno == ENOMEM ? ENOMEM : 0) {}
 
-    // True when there was no memory to open the walk. The error number then says so.
-    bool out_of_memory() const { return out_of_memory_; }
+    // The error number when there was no memory to open the walk, otherwise 0.
+    int opening_error() const { return opening_error_; }
 
     // The name of the next entry, or nullptr at the end and after a failure, which ends the walk.
     const char* next() {
@@ -57,7 +57,7 @@ private:
     }
 
     std::unique_ptr<DIR, directory_closer> directory_;
-    bool out_of_memory_;
+    int opening_error_;
 };
 
 } // namespace initialiser

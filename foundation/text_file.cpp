@@ -1,6 +1,7 @@
 #include "foundation/text_file.h"
 
 #include "foundation/descriptor.h"
+#include "foundation/repeat_interrupted.h"
 
 #include <fcntl.h>
 #include <sys/stat.h>

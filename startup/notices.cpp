@@ -3,6 +3,7 @@
 #include "foundation/data_protection.h"
 #include "foundation/descriptor.h"
 #include "foundation/paths.h"
+#include "foundation/repeat_interrupted.h"
 #include "foundation/text_file.h"
 
 #include <err.h>
@@ -14,9 +15,13 @@ namespace {
 
 constexpr mode_t marker_mode = 0666; // less the process's mask
 
+// A planted link must not make a file elsewhere, and a FIFO's reader is not waited for.
+constexpr int marker_flags = O_RDWR | O_CREAT | O_NOFOLLOW | O_NONBLOCK | O_NOCTTY | O_CLOEXEC;
+
 bool open_and_close_marker() noexcept {
-    vorl_descriptor marker{
-        open_protected(cleanup_marker, O_RDWR | O_CREAT, always_readable, 0, marker_mode)};
+    vorl_descriptor marker{repeat_interrupted([] {
+        return open_protected(cleanup_marker, marker_flags, always_readable, 0, marker_mode);
+    })};
     if (!marker.is_open()) {
         return false;
     }

@@ -4,6 +4,7 @@
 #include "foundation/descriptor.h"
 #include "foundation/file_system.h"
 #include "foundation/paths.h"
+#include "foundation/repeat_interrupted.h"
 
 #include <err.h>
 #include <fcntl.h>
@@ -28,7 +29,7 @@ void prepare_storage() noexcept {
     set_directory_protection(stored_datasets);
 }
 
-void migrate_legacy_icutz() {
+void migrate_legacy_icutz() noexcept {
     if (exists(legacy_icu_link) && !exists(icu_link)) {
         try {
             create_symlink(read_symlink(legacy_icu_link), icu_link);

@@ -3,14 +3,15 @@
 namespace initialiser {
 
 // Gives the storage area and the directory of the stored data sets the data-protection class that
-// can be read at start-up; on Linux there are none, and nothing is set. A missing directory is no
-// error and is not made. Prints and throws nothing.
+// can be read at start-up. Linux has no such classes, so nothing is set there. A missing directory
+// is passed over and not made. Prints and throws nothing.
 void prepare_storage() noexcept;
 
-// Moves the ICU link of older systems into the storage area with its target text unchanged, unless
-// a link that leads somewhere is there already; then removes the old link. A link that leads
-// nowhere counts as missing in both places. When one of the two fails, its own line is followed by
-// "Could not migrate OLD to NEW" or "Could not remove OLD". Throws nothing.
-void migrate_legacy_icutz();
+// Copies the ICU link of older systems into the storage area with its target text unchanged, unless
+// a link that leads somewhere is there already. Then removes the old link. A link that leads
+// nowhere counts as missing in both places. A failed copy prints its own line and "Could not
+// migrate OLD to NEW"; a failed removal prints its own line and "Could not remove OLD". Throws
+// nothing.
+void migrate_legacy_icutz() noexcept;
 
 } // namespace initialiser
