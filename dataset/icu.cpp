@@ -39,7 +39,7 @@ void vorl_icu::initialize() {
 }
 
 void vorl_icu::find_schema_of_files() {
-    const vorl_expression expression{icu_file_expression};
+    static const vorl_expression expression{icu_file_expression};
     vorl_directory_walk walk{icu_path_};
     if (const int error = walk.opening_error(); error != 0) {
         errno = error;

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <compare>
 #include <cstdint>
 #include <string>
 
@@ -11,7 +12,7 @@ namespace initialiser {
 class vorl_version {
 public:
     vorl_version() = default;
-    explicit vorl_version(const std::string& text);
+    explicit vorl_version(const std::string& text) { parse(text); }
 
     // Sets all four fields from `text`. For a text of another form, prints "Cannot parse version
     // string TEXT, results.size() = 0" and "Cannot parse version string TEXT" and sets the default
@@ -19,12 +20,15 @@ public:
     // fields before that number are then set.
     void parse(const std::string& text);
 
-    // Compares year, letters (as bytes), major and minor, in this order.
-    bool newer_than(const vorl_version& other) const;
-    bool equals(const vorl_version& other) const;
+    // Compare year, letters (as bytes), major and minor, in this order.
+    bool newer_than(const vorl_version& other) const { return *this > other; }
+    bool equals(const vorl_version& other) const { return *this == other; }
+    // NOLINTNEXTLINE(modernize-use-nullptr): clang-tidy 14 takes a 0 inside it for a pointer.
+    std::strong_ordering operator<=>(const vorl_version& other) const = default;
 
     static constexpr std::int32_t absent = -1; // a number that the text doesn't have; below 0
 
+    // In the order of comparison.
     std::int32_t year = absent;
     std::string letters;
     std::int32_t major = absent;
