@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstddef>
 #include <string>
 
 // Small text files. Neither operation prints, or waits for another program. Only a regular file is
@@ -7,9 +8,14 @@
 // unless it takes a file's place in the instant before the open.
 namespace initialiser {
 
+// The longest word that is read, in bytes. It is far above what any real data need. It keeps an
+// endless file from taking all memory.
+inline constexpr std::size_t longest_word = 24'000'000;
+
 // The first word of the file at `path`, links followed: leading white space is skipped, and the
-// next white space or the end of the file ends the word, however long it is. A missing file is no
-// error: that, a file that can't be read, and anything but a regular file give the empty text.
+// next white space or the end of the file ends the word. The text is empty for a missing file, for
+// one that can't be read, and for anything but a regular file. Throws no_error_number for a word
+// that is too long.
 std::string read_first_word(const std::string& path);
 
 // Makes `text` the whole content of the regular file at `path`, and flushes it to the disk. A

@@ -1,10 +1,8 @@
 #include "startup/process_guards.h"
 
 #include <fcntl.h>
-#include <sys/resource.h>
 #include <unistd.h>
 
-#include <algorithm>
 #include <array>
 #include <cerrno>
 #include <csignal>
@@ -25,19 +23,6 @@ void occupy_standard_descriptors() noexcept {
     }
 }
 
-void bound_memory() noexcept {
-#ifndef VORL_MEMORY_UNBOUNDED
-    // Far above what any real data need (a version word of 20 million bytes still fits), and far
-    // below what the rest of the system would miss.
-    constexpr rlim_t memory_bound = rlim_t{256} << 20U;
-    rlimit data{};
-    if (::getrlimit(RLIMIT_DATA, &data) == 0) {
-        data.rlim_cur = std::min(data.rlim_cur, memory_bound);
-        static_cast<void>(::setrlimit(RLIMIT_DATA, &data));
-    }
-#endif
-}
-
 } // namespace
 
 void guard_process() noexcept {
@@ -49,7 +34,6 @@ void guard_process() noexcept {
     // A line reaches the log whole: some logs make a record of each write.
     static std::array<char, BUFSIZ> line{};
     static_cast<void>(std::setvbuf(stderr, line.data(), _IOLBF, line.size()));
-    bound_memory();
 }
 
 } // namespace initialiser

@@ -6,8 +6,7 @@ namespace initialiser {
 // - messages carry the program's own name, and a line of usual length is one write;
 // - a message can't end the process when nobody reads it, nor land in a file that was opened under
 //   the number of a closed standard error;
-// - a limit on the size of files fails a write instead of ending the process;
-// - memory has a bound, so that an endless file is a failure like any other.
+// - a limit on the size of files fails a write instead of ending the process.
 // What can't be set stays as it was.
 void guard_process() noexcept;
 
