@@ -14,17 +14,18 @@ namespace {
 
 // One start-up: six phases in a fixed order, each working on what the ones before left on disk.
 // Returns the exit status. It is 0 at the end, whatever was found and corrected on the way.
-int start_up() {
+int start_up() noexcept {
+    prepare_storage();
+    migrate_legacy_icutz();
+    discard(cleanup_marker);
+    discard(legacy_item);
     try {
-        prepare_storage();
-        migrate_legacy_icutz();
-        discard(cleanup_marker);
-        discard(legacy_item);
         select_and_activate_dataset();
     } catch (...) {
         warn("The time-zone links could not be reset");
-        // Without a zoneinfo link the user's zone would look invalid, and the repair of the
-        // localtime link would lose it. So that link is left to the next start-up.
+        // The zoneinfo link may be missing. The zone of a localtime link in the old place then
+        // looks as if it did not exist, and the repair would replace it by the default zone. So
+        // the localtime link is left to the next start-up.
         return EXIT_FAILURE;
     }
     try {
