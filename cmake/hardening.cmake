@@ -2,11 +2,12 @@
 include(CheckCXXSourceCompiles)
 include(CheckLinkerFlag)
 
-# The checks compile as the program is compiled: without optimisation no level is to be had.
+# The checks below compile with the program's optimisation: without any, the C library warns of every
+# level.
 set(CMAKE_TRY_COMPILE_CONFIGURATION ${CMAKE_BUILD_TYPE})
 
-# The C library warns of a level that the compiler does not know. Debian's compiler may define the
-# macro already, at a lower level.
+# The C library warns of a level that the compiler does not know, and the next one is tried. Debian's
+# compiler may define the macro already, at a lower level: it is undefined first.
 foreach(level 3 2)
   set(fortify -U_FORTIFY_SOURCE -D_FORTIFY_SOURCE=${level})
   list(JOIN fortify " " CMAKE_REQUIRED_FLAGS)
@@ -26,9 +27,9 @@ target_compile_options(vorl_options INTERFACE
 target_link_options(vorl_executable INTERFACE
   -Wl,--gc-sections -Wl,-z,relro,-z,now,-z,noexecstack)
 
-# Static: nothing else of the system need be there. Position-independent: besides the hardening, the
-# first exception of a static program at a fixed address sorts all its frame tables, which costs
-# several times the whole start-up (riscv64 pays that; armhf has other tables, sorted already).
+# Static: the program needs nothing else of the system. Position-independent: this hardens it, and
+# saves time. In a static program at a fixed address the first exception sorts all frame tables, which
+# costs several times the whole start-up. riscv64 pays that; armhf has tables that are sorted already.
 check_linker_flag(CXX -static-pie VORL_STATIC_PIE)
 if(VORL_STATIC_PIE)
   target_link_options(vorl_executable INTERFACE -static-pie)

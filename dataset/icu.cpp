@@ -43,7 +43,7 @@ void vorl_icu::find_schema_of_files() {
     vorl_directory_walk walk{icu_path_};
     if (const int error = walk.opening_error(); error != 0) {
         errno = error;
-        // Other programs look for this text: its names stay as they are.
+        // Other programs look for this text, so it keeps its names.
         warn("tz_icu::initialize: fts_open of %s failed, %s", icu_path_.c_str(), strerror(error));
         throw error;
     }
@@ -70,8 +70,7 @@ void vorl_icu::install_links() const {
         remove(icu_link);
         remove(legacy_icu_link);
     } catch (...) {
-        // In lower case, unlike its fellow for the zoneinfo link: other programs look for this
-        // text.
+        // Other programs look for this text, so it stays in lower case.
         warn("unlink of ICU softlink failed");
     }
     if (!dataset_path_.empty()) {

@@ -18,8 +18,8 @@ namespace initialiser {
 // than the entries before the one sought.
 class vorl_directory_walk {
 public:
-    // Opens the walk; `path` itself may be a link. A missing directory is no error, nor is one that
-    // can't be read or isn't a directory: the walk then has no entries.
+    // Opens the walk; `path` itself may be a link. The walk has no entries when the directory is
+    // missing or can't be read, or when something else stands there.
     explicit vorl_directory_walk(const std::string& path)
         : directory_(repeat_interrupted([&] { return ::opendir(path.c_str()); })),
           opening_error_(directory_ == nullptr && errno == ENOMEM ? ENOMEM : 0) {}
@@ -45,7 +45,8 @@ private:
         void operator()(DIR* directory) const { ::closedir(directory); }
     };
 
-    // The end of a directory sets no error number, so an earlier one is put aside.
+    // The end of a directory sets no error number. An earlier EINTR would pass for this call's, so
+    // it is put aside.
     const dirent* read_entry() {
         const int earlier = std::exchange(errno, 0);
         const dirent* const entry =

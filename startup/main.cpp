@@ -23,9 +23,9 @@ int start_up() noexcept {
         select_and_activate_dataset();
     } catch (...) {
         warn("The time-zone links could not be reset");
-        // The zoneinfo link may be missing. The zone of a localtime link in the old place then
-        // looks as if it did not exist, and the repair would replace it by the default zone. So
-        // the localtime link is left to the next start-up.
+        // The zoneinfo link may be missing. Without it no zone can be found, and the repair would
+        // set the default zone in place of one in the old place. So the next start-up repairs the
+        // localtime link.
         return EXIT_FAILURE;
     }
     try {

@@ -2,12 +2,12 @@
 
 #include <string>
 
-// What a start-up leaves on disk for other programs. The links matter more: a failure here ends
-// nothing and throws nothing.
+// What a start-up leaves on disk for other programs. The links matter more, so no failure here is
+// thrown.
 namespace initialiser {
 
-// Makes sure that the cleanup marker exists; one that does is left as it is. Prints "Cannot touch
-// file PATH" when it can't.
+// Makes the cleanup marker, unless it exists: then it is left as it is. When it can't, prints
+// "Cannot touch file PATH".
 void touch_cleanup_marker() noexcept;
 
 // Makes "OLD_NEW", without a line end, the whole content of the version-difference record. Prints

@@ -11,8 +11,8 @@
 namespace initialiser {
 namespace {
 
-// Fills the closed ones of descriptors 0 to 2 with one that can neither be read nor written. The
-// root directory serves since a bare root has no /dev/null.
+// Opens what can neither be read nor written under each number from 0 to 2 that is closed. It is
+// the root directory, since a bare root has no /dev/null.
 void occupy_standard_descriptors() noexcept {
     int filler = 0;
     while (filler >= 0 && filler <= STDERR_FILENO) {
