@@ -23,13 +23,6 @@ newer() { # VERSION VERSION
     [ "$minor" -gt "$minor2" ]
 }
 
-compatible() { # DATA SET
-    for file in "$1"/icutz/icutz[0-9]*[lbe].dat; do
-        [ "${file##*/}" != "icutz$schema.dat" ] || return 0
-    done
-    return 1
-}
-
 rm -f $db/needs_cleanup /var/db/icu
 read -r release _ <$system/+VERSION
 read -r schema _ </usr/share/icu/icutzformat.txt
@@ -39,13 +32,13 @@ current=$(readlink $db/zoneinfo) || current=$system
 current=${current%/zoneinfo} current_version=${current##*/}
 if [ "$current" = $system ]; then
     current_version=$system_version
-elif ! compatible "$current" || newer "$system_version" "$current_version"; then
+elif [ ! -e "$current/icutz/icutz$schema.dat" ] || newer "$system_version" "$current_version"; then
     rm -f $db/zoneinfo $db/icutz /var/db/icutz
     ln -s $system $db/zoneinfo
     touch $db/needs_cleanup
 fi
 
-if latest=$(readlink $db/tz_latest) && compatible "$latest" &&
+if latest=$(readlink $db/tz_latest) && [ -e "$latest/icutz/icutz$schema.dat" ] &&
     newer "${latest##*/}" "$current_version"; then
     rm -f $db/zoneinfo $db/icutz /var/db/icutz
     ln -s "$latest/zoneinfo" "$latest/icutz" $db
