@@ -1,7 +1,5 @@
 #pragma once
 
-#include "foundation/descriptor.h"
-
 #include <map>
 #include <string>
 #include <utility>
@@ -12,7 +10,6 @@ namespace initialiser {
 // Paths and what is put, or expected, there. tests/scenarios/README.md explains both.
 using changes = std::vector<std::pair<std::string, std::string>>;
 using tree = std::map<std::string, std::string>;
-using messages = std::vector<std::string>;
 
 struct outcome {
     int status; // the exit status; for a signal 128 and its number
@@ -27,27 +24,24 @@ public:
     explicit vorl_device(const changes& found = {});
     ~vorl_device();
 
-    void put(const changes& list);
+    void put(const changes& list) const;
 
     // With `stamped`, a file that was made anew differs from one that was left alone.
     tree contents(bool stamped = false) const;
 
-    // One start-up of the real program. One that doesn't end is killed, and an exception says so.
-    outcome start_up() const;
+    // Fails the test, with what differs, unless the device holds just that.
+    void expect(const tree& expected) const;
 
-    // The program's path.
-    std::string program() const { return "/proc/self/fd/" + std::to_string(program_.number()); }
-
-private:
-    vorl_descriptor program_; // opened before something hides it
-    messages hidden_;
+    // One start-up of the real program. A command of the shell may do it in its own way: $program
+    // starts the program, and $strace is strace, made ready for it. One that doesn't end is killed:
+    // status 124.
+    outcome start_up(const std::string& command = "") const;
 };
+
+// The zoneinfo and ICU links on a stored data set, or on "system".
+changes links_on(const std::string& version);
 
 // `contents` after the changes of `list`.
 tree after(tree contents, const changes& list);
-
-// The lines that were printed, without the program's name; each also without its error text where
-// the line expected in its place has none.
-messages lines_of(const std::string& printed, const messages& expected);
 
 } // namespace initialiser
