@@ -1,17 +1,13 @@
 """What stands in the storage area."""
-
 import os
 
-DB = "/var/db/timezone/"
+AREA = "/var/db/timezone/"
+NAMES = "zoneinfo", "icutz", "localtime", "needs_cleanup", "TZVersionDiffRecord"
 
 
-def entries():
-    found = {}
-    for name in "zoneinfo", "icutz", "localtime":
-        found[name] = os.readlink(DB + name) if os.path.islink(DB + name) else "none"
-    found["marker"] = "yes" if os.path.lexists(DB + "needs_cleanup") else "none"
-    try:
-        found["record"] = open(DB + "TZVersionDiffRecord").read() or "empty"
-    except FileNotFoundError:
-        found["record"] = "none"
-    return found
+def entry(name):
+    if os.path.islink(AREA + name):
+        return os.readlink(AREA + name)
+    if not os.path.isfile(AREA + name):
+        return "none"
+    return open(AREA + name).read() or "empty"
