@@ -52,7 +52,7 @@ bool add_line(scenario& shown, const std::smatch& line) {
 
 std::vector<scenario> scenarios() {
     std::vector<scenario> all;
-    const std::regex form{R"((\S*)\s*((\S*) ?(.*?))\s*)"};
+    const std::regex form{R"(\s*(\S*)\s*((\S*) ?(.*?))\s*)"};
     std::smatch parts;
     for (const std::string kind : {"datasets", "links", "faults"}) {
         std::ifstream file{VORL_SCENARIOS "/" + kind + ".txt"};
