@@ -1,11 +1,8 @@
 #!/bin/sh
-# The start-up as a script, as one would first write it. Left out: the messages and most of what can
-# be wrong with a device.
+# The start-up as one would first write it, without the messages and most of what can be wrong.
 set -eu
 export LC_ALL=C
-
-db=/var/db/timezone
-system=/usr/share/zoneinfo.default
+db=/var/db/timezone system=/usr/share/zoneinfo.default
 
 newer() { # VERSION VERSION
     [ "$1" != "$2" ] && [ "$(printf '%s\n' "$1" "$2" | sort -V | tail -n 1)" = "$1" ]
@@ -14,7 +11,6 @@ newer() { # VERSION VERSION
 rm -f $db/needs_cleanup /var/db/icu
 read -r release _ <$system/+VERSION
 read -r schema _ </usr/share/icu/icutzformat.txt
-
 current=$(readlink $db/zoneinfo) || current=$system
 current=${current%/zoneinfo} current_version=${current##*/}
 if [ "$current" = $system ]; then
