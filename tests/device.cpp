@@ -32,10 +32,6 @@ void must(bool done, const std::string& what) {
     }
 }
 
-void write_file(const fs::path& path, const std::string& text) {
-    must((std::ofstream{path} << text).flush().good(), path);
-}
-
 // The program is opened before something hides it.
 bool make_ready() {
     must(getenv("own_mounts") != nullptr, "start the tests by scripts/own_mounts");
@@ -115,7 +111,8 @@ void vorl_device::put(const changes& list) const {
         } else if (what.starts_with("-> ")) {
             fs::create_symlink(what.substr(3), path);
         } else if (what == "=" || what == "private" || what.starts_with("= ")) {
-            write_file(path, what.starts_with("= ") ? what.substr(2) : "");
+            const std::string text = what.starts_with("= ") ? what.substr(2) : "";
+            must((std::ofstream{path} << text).flush().good(), path);
             fs::permissions(path, fs::perms{what == "private" ? 0640U : 0644U});
         } else if (what != "nothing") {
             throw std::invalid_argument("no such thing: " + what);
