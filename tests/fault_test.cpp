@@ -1,4 +1,4 @@
-#include "device.h"
+#include "harness.h"
 
 #include <gtest/gtest.h>
 

@@ -1,5 +1,5 @@
 #include "dataset/dataset.h"
-#include "device.h"
+#include "harness.h"
 #include "foundation/expression.h"
 #include "foundation/file_system.h"
 #include "foundation/text_file.h"

@@ -1,4 +1,4 @@
-#include "device.h"
+#include "harness.h"
 
 #include <fcntl.h>
 #include <gtest/gtest.h>
