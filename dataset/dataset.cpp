@@ -7,7 +7,9 @@
 #include <err.h>
 
 #include <algorithm>
+#include <memory>
 #include <stdexcept>
+#include <string>
 #include <utility>
 
 namespace initialiser {

@@ -1,25 +1,34 @@
 #include "dataset/icu.h"
 
+#include "dataset/component.h"
 #include "foundation/directory_walk.h"
-#include "foundation/expression.h"
 #include "foundation/file_system.h"
 #include "foundation/paths.h"
 #include "foundation/text_file.h"
+#include "foundation/text_reader.h"
 
 #include <err.h>
 
 #include <cerrno>
 #include <cstring>
-#include <vector>
+#include <string>
+#include <string_view>
 
 namespace initialiser {
-namespace {
 
-// Names that tell the schema: digits and one letter, which stands for the byte order and character
-// set of the files.
-constexpr auto icu_file_expression = R"(icutz([0-9]+[lbe])\.dat)";
-
-} // namespace
+std::string schema_of_icu_file(std::string_view name) {
+    // icutz([0-9]+[lbe])\.dat
+    vorl_text_reader reader{name};
+    if (!reader.take("icutz")) {
+        return {};
+    }
+    const std::string_view digits = reader.take_digits();
+    const std::string_view letter = reader.take_all_of("lbe");
+    if (digits.empty() || letter.size() != 1 || !reader.take(".dat") || !reader.is_at_end()) {
+        return {};
+    }
+    return std::string{digits} + std::string{letter};
+}
 
 vorl_icu::vorl_icu(const std::string& path)
     : vorl_dataset_component(path),
@@ -39,7 +48,6 @@ void vorl_icu::initialize() {
 }
 
 void vorl_icu::find_schema_of_files() {
-    static const vorl_expression expression{icu_file_expression};
     vorl_directory_walk walk{icu_path_};
     if (const int error = walk.opening_error(); error != 0) {
         errno = error;
@@ -48,9 +56,9 @@ void vorl_icu::find_schema_of_files() {
         throw error;
     }
     while (const char* const name = walk.next()) {
-        const std::vector<std::string> groups = expression.match_whole(name);
-        if (!groups.empty() && walk.is_public_file(name)) {
-            schema_ = groups[1];
+        const std::string schema = schema_of_icu_file(name);
+        if (!schema.empty() && walk.is_public_file(name)) {
+            schema_ = schema;
             return;
         }
     }

@@ -3,6 +3,7 @@
 #include "dataset/component.h"
 
 #include <string>
+#include <string_view>
 
 namespace initialiser {
 
@@ -33,5 +34,9 @@ private:
     std::string schema_;
     std::string icu_path_;
 };
+
+// The schema that the name of an ICU file tells: digits and one letter, which stands for the byte
+// order and the character set of the files. Empty for any other name.
+std::string schema_of_icu_file(std::string_view name);
 
 } // namespace initialiser

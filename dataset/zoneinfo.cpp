@@ -1,10 +1,13 @@
 #include "dataset/zoneinfo.h"
 
+#include "dataset/component.h"
 #include "foundation/file_system.h"
 #include "foundation/paths.h"
 #include "foundation/text_file.h"
 
 #include <err.h>
+
+#include <string>
 
 namespace initialiser {
 

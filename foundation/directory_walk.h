@@ -35,8 +35,9 @@ public:
 
     // True when the entry `name` is a regular file, not a link to one, that everyone may read.
     bool is_public_file(const char* name) const {
-        struct stat status {};
-        return ::fstatat(::dirfd(directory_.get()), name, &status, AT_SYMLINK_NOFOLLOW) == 0 &&
+        const int directory = ::dirfd(directory_.get());
+        struct stat status{};
+        return directory >= 0 && ::fstatat(directory, name, &status, AT_SYMLINK_NOFOLLOW) == 0 &&
                S_ISREG(status.st_mode) && (status.st_mode & S_IROTH) != 0;
     }
 

@@ -1,11 +1,14 @@
 #include "foundation/file_system.h"
 
 #include <err.h>
+#include <sys/types.h>
 #include <unistd.h>
 
 #include <array>
 #include <cerrno>
+#include <cstddef>
 #include <cstdio>
+#include <string>
 
 namespace initialiser {
 namespace {

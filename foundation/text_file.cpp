@@ -6,9 +6,13 @@
 
 #include <fcntl.h>
 #include <sys/stat.h>
+#include <sys/types.h>
+#include <unistd.h>
 
 #include <algorithm>
 #include <array>
+#include <cstddef>
+#include <string>
 #include <string_view>
 
 namespace initialiser {
@@ -25,7 +29,7 @@ vorl_descriptor open_regular_file(const std::string& path, int flags) noexcept {
     vorl_descriptor file{repeat_interrupted([&] {
         return ::open(path.c_str(), flags | O_CLOEXEC | O_NONBLOCK | O_NOCTTY, new_file_mode);
     })};
-    struct stat status {};
+    struct stat status{};
     if (file.is_open() && (::fstat(file.number(), &status) != 0 || !S_ISREG(status.st_mode))) {
         file.close();
     }
@@ -34,7 +38,7 @@ vorl_descriptor open_regular_file(const std::string& path, int flags) noexcept {
 
 // Looks before the open, since opening a device can act: a watchdog starts.
 vorl_descriptor open_for_reading(const std::string& path) noexcept {
-    struct stat status {};
+    struct stat status{};
     if (::stat(path.c_str(), &status) != 0 || !S_ISREG(status.st_mode)) {
         return vorl_descriptor{-1};
     }
@@ -42,7 +46,7 @@ vorl_descriptor open_for_reading(const std::string& path) noexcept {
 }
 
 vorl_descriptor open_for_writing(const std::string& path) noexcept {
-    struct stat status {};
+    struct stat status{};
     if (::lstat(path.c_str(), &status) == 0 && !S_ISREG(status.st_mode)) {
         return vorl_descriptor{-1};
     }

@@ -1,37 +1,40 @@
 #include "foundation/version.h"
 
-#include "foundation/expression.h"
+#include "foundation/text_reader.h"
 
 #include <err.h>
 
-#include <vector>
+#include <cstdint>
+#include <string>
+#include <string_view>
 
 namespace initialiser {
 namespace {
 
-constexpr auto version_expression = R"(([0-9]+)([a-z]+)(?:\.([0-9]+))?(?:\.([0-9]+))?)";
-constexpr std::size_t entries_of_a_match = 5; // the whole text and four groups
-
-std::int32_t number_or_absent(const std::string& digits) {
-    return digits.empty() ? vorl_version::absent : std::stoi(digits);
+std::int32_t number_or_absent(std::string_view digits) {
+    return digits.empty() ? vorl_version::absent : std::stoi(std::string{digits});
 }
 
 } // namespace
 
 void vorl_version::parse(const std::string& text) {
-    static const vorl_expression expression{version_expression};
-    const std::vector<std::string> results = expression.match_whole(text);
-    if (results.size() != entries_of_a_match) {
-        warn("Cannot parse version string %s, results.size() = %d", text.c_str(),
-             static_cast<int>(results.size()));
+    // ([0-9]+)([a-z]+)(?:\.([0-9]+))?(?:\.([0-9]+))?
+    vorl_text_reader reader{text};
+    const std::string_view year_digits = reader.take_digits();
+    const std::string_view release_letters = reader.take_letters();
+    const std::string_view major_digits = reader.take_dot_and_digits();
+    const std::string_view minor_digits = reader.take_dot_and_digits();
+    if (year_digits.empty() || release_letters.empty() || !reader.is_at_end()) {
+        // Other programs look for this text, so it keeps its number: that of the parts found.
+        warn("Cannot parse version string %s, results.size() = %d", text.c_str(), 0);
         warn("Cannot parse version string %s", text.c_str());
         *this = vorl_version{};
         return;
     }
-    year = std::stoi(results[1]);
-    letters = results[2];
-    major = number_or_absent(results[3]);
-    minor = number_or_absent(results[4]);
+    year = number_or_absent(year_digits);
+    letters = release_letters;
+    major = number_or_absent(major_digits);
+    minor = number_or_absent(minor_digits);
 }
 
 } // namespace initialiser

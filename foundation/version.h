@@ -23,7 +23,6 @@ public:
     // Compare year, letters (as bytes), major and minor, in this order.
     bool newer_than(const vorl_version& other) const { return *this > other; }
     bool equals(const vorl_version& other) const { return *this == other; }
-    // NOLINTNEXTLINE(modernize-use-nullptr): clang-tidy 14 takes a 0 inside it for a pointer.
     std::strong_ordering operator<=>(const vorl_version& other) const = default;
 
     static constexpr std::int32_t absent = -1; // a number that the text doesn't have; below 0

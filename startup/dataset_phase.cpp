@@ -7,6 +7,8 @@
 
 #include <err.h>
 
+#include <string>
+
 namespace initialiser {
 
 std::string dataset_path_of_zoneinfo_link(const std::string& target) {

@@ -9,6 +9,9 @@
 #include <err.h>
 #include <fcntl.h>
 #include <sys/stat.h>
+#include <sys/types.h>
+
+#include <string>
 
 namespace initialiser {
 namespace {
@@ -25,7 +28,7 @@ bool open_and_close_marker() noexcept {
     if (!marker.is_open()) {
         return false;
     }
-    struct stat status {};
+    struct stat status{};
     const bool has_status = ::fstat(marker.number(), &status) == 0;
     return marker.close() && has_status;
 }

@@ -1,29 +1,91 @@
 #include "dataset/dataset.h"
-#include "harness.h"
-#include "foundation/expression.h"
+#include "dataset/icu.h"
 #include "foundation/file_system.h"
 #include "foundation/text_file.h"
 #include "foundation/version.h"
+#include "harness.h"
 #include "startup/dataset_phase.h"
 
 #include <gtest/gtest.h>
 
+#include <cstddef>
+#include <cstdio>
+#include <regex>
 #include <stdexcept>
+#include <string>
+#include <utility>
+#include <vector>
 
 // What whole start-ups don't show, or only at length.
 namespace initialiser {
 namespace {
 
-TEST(version, parses_whole_texts_only) {
-    for (const std::string text : {"2019C", "2019", "2019c.", "2019c.1.0.2", "", "v2019c", " 2019c",
-                                   "2019c ", "2019c.1.0/", "2019\xe4"}) {
-        vorl_version version{"1a.2.3"};
-        version.parse(text);
-        EXPECT_TRUE(version.equals(vorl_version{})) << text;
+// All texts of `beginning` and up to `more` bytes of `alphabet`.
+std::vector<std::string> texts(const std::string& beginning, std::size_t more,
+                               const std::string& alphabet) {
+    std::vector<std::string> all = {beginning};
+    for (std::size_t next = 0; all[next].size() < beginning.size() + more; ++next) {
+        for (const char byte : alphabet) {
+            all.push_back(all[next] + byte);
+        }
     }
-    for (const std::string text : {"2147483648c", "2019c.2147483648.4", "2019c.1.99999999999"}) {
+    return all;
+}
+
+vorl_version version_by_expression(const std::string& text) {
+    static const std::regex form{R"(([0-9]+)([a-z]+)(?:\.([0-9]+))?(?:\.([0-9]+))?)"};
+    const auto number = [](const std::string& digits) {
+        return digits.empty() ? -1 : stoi(digits);
+    };
+    vorl_version version;
+    if (std::smatch part; std::regex_match(text, part, form)) {
+        version.year = number(part[1]);
+        version.letters = part[2];
+        version.major = number(part[3]);
+        version.minor = number(part[4]);
+    }
+    return version;
+}
+
+std::string schema_by_expression(const std::string& name) {
+    static const std::regex form{R"(icutz([0-9]+[lbe])\.dat)"};
+    std::smatch part;
+    return std::regex_match(name, part, form) ? part[1].str() : "";
+}
+
+// Beside the ends of each range of bytes the alphabets have their neighbours and bytes of other
+// kinds.
+TEST(version, has_its_form) {
+    FILE* const shown = std::exchange(stderr, std::fopen("/dev/null", "we")); // many messages
+    for (const std::string beginning : {"", "9z", "9z.0", "9z.0.9"}) {
+        for (const std::string& text : texts(beginning, 4, "/09:`az{.A \xe4")) {
+            vorl_version version{"1a.2.3"};
+            version.parse(text);
+            EXPECT_TRUE(version.equals(version_by_expression(text))) << text;
+        }
+    }
+    std::fclose(std::exchange(stderr, shown));
+}
+
+TEST(icu, files_have_their_form) {
+    for (const std::string beginning : {"", "icutz", "icutz9l"}) {
+        for (const std::string& text : texts(beginning, 3, "/09:lbekmacdft.L \xe4")) {
+            for (const std::string& name : {text, text + ".dat"}) {
+                EXPECT_EQ(schema_of_icu_file(name), schema_by_expression(name)) << name;
+            }
+        }
+    }
+}
+
+TEST(version, has_numbers_up_to_a_limit) {
+    for (const std::string text : {"2147483648c", "2c.2147483648.4", "2c.1.99999999999"}) {
         EXPECT_THROW(vorl_version{text}, std::out_of_range) << text;
     }
+    vorl_version version{"1a.2.3"};
+    EXPECT_THROW(version.parse("2c.4.2147483648"), std::out_of_range);
+    EXPECT_TRUE(version.equals(vorl_version{"2c.4.3"})) << "what stands before the number is set";
+    const std::string letters(100'000, 'a');
+    EXPECT_EQ(vorl_version{"1" + letters}.letters, letters);
 }
 
 TEST(version, is_strictly_and_totally_ordered) {
@@ -37,11 +99,6 @@ TEST(version, is_strictly_and_totally_ordered) {
             EXPECT_EQ(vorl_version{*one}.equals(vorl_version{*other}), one == other);
         }
     }
-}
-
-TEST(expression, matches_long_texts) {
-    const std::string word(100'000, 'a');
-    EXPECT_EQ(vorl_expression{"([0-9]+)([a-z]+)"}.match_whole("1" + word)[2], word);
 }
 
 TEST(file_system, cuts_long_targets) {
