@@ -9,8 +9,8 @@ namespace initialiser {
 // the installed system, and how to point the system's links for its kind of data at itself.
 class vorl_dataset_component {
 public:
-    // True when this component's data can be used with those of `other`, the component at the same
-    // place in the system data set. Changes nothing; may print; never throws.
+    // True when this component's data can be used with those of `other`, the system data set's
+    // component of the same kind. Changes nothing; may print; never throws.
     virtual bool compatible_schema(const vorl_dataset_component& other) const = 0;
 
     // Removes the old links for this kind of data, then makes the new one where the kind has one.

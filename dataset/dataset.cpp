@@ -15,8 +15,8 @@
 namespace initialiser {
 namespace {
 
-// The system's tz database names only its tz release. This makes it a version: that of the first
-// data set with that release.
+// The system's tz database names only its tz release, such as 2019c. An updater numbers the data
+// sets of a release from 1.0 on, and the system's counts as the first of them.
 constexpr auto system_version_suffix = ".1.0";
 
 bool is_among_stored_datasets(const std::string& path) {

@@ -11,7 +11,7 @@ namespace initialiser {
 
 // One complete set of time-zone data: where it lies, its version, and its two components. The empty
 // path is the system data set. Any other is a stored data set's directory, named by its version
-// text. A data set is complete when it is built, never changes and is never copied.
+// text. After its construction a data set never changes, and it is never copied.
 class vorl_dataset {
 public:
     // Builds the data set at `path`, or the system data set. For a path that is neither empty nor
@@ -22,7 +22,7 @@ public:
     vorl_dataset(const vorl_dataset&) = delete;
     vorl_dataset& operator=(const vorl_dataset&) = delete;
 
-    // True when each component is compatible with the other data set's at the same place.
+    // True when each component is compatible with the other data set's component of its kind.
     bool compatible_with(const vorl_dataset& other) const;
     bool newer_than(const vorl_dataset& other) const;
     bool same_path(const vorl_dataset& other) const;

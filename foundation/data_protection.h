@@ -18,7 +18,7 @@ inline constexpr int set_class_command = 64;
 
 // Applies a data-protection command to an open directory. Here it changes nothing and returns -1.
 // It makes no system call, since Linux may one day give the command's number another meaning. It
-// leaves the error number alone, which would show up behind the next message.
+// leaves the error number alone, because the next message shows it.
 inline int control_protection(int /*descriptor*/, int /*command*/,
                               int /*protection_class*/) noexcept {
     return -1;

@@ -46,8 +46,8 @@ private:
         void operator()(DIR* directory) const { ::closedir(directory); }
     };
 
-    // The end of a directory sets no error number. An earlier EINTR would pass for this call's, so
-    // it is put aside.
+    // readdir sets no error number at the end of a directory. An EINTR left by an earlier call
+    // would then look like an interruption, so the number is cleared first and put back.
     const dirent* read_entry() {
         const int earlier = std::exchange(errno, 0);
         const dirent* const entry =

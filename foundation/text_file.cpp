@@ -21,8 +21,8 @@ namespace {
 constexpr std::size_t block_size = 16384;
 constexpr mode_t new_file_mode = 0666; // less the process's mask
 
-// Opens `path` and looks at what is open: since the caller's look, something else may have taken
-// the file's place. Gives a closed descriptor for anything but a regular file.
+// Opens `path`. Then looks again, at what is now open: something else may have taken the file's
+// place after the caller's look. Returns a closed descriptor for anything but a regular file.
 vorl_descriptor open_regular_file(const std::string& path, int flags) noexcept {
     // O_NONBLOCK: a FIFO must not wait for its other end. Nor must /proc/kmsg, which is a regular
     // file to the kernel, wait for the next message.
@@ -36,7 +36,7 @@ vorl_descriptor open_regular_file(const std::string& path, int flags) noexcept {
     return file;
 }
 
-// Looks before the open, since opening a device can act: a watchdog starts.
+// Looks before the open: opening a device can set it to work, as it does a watchdog.
 vorl_descriptor open_for_reading(const std::string& path) noexcept {
     struct stat status{};
     if (::stat(path.c_str(), &status) != 0 || !S_ISREG(status.st_mode)) {

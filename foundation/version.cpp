@@ -25,7 +25,7 @@ void vorl_version::parse(const std::string& text) {
     const std::string_view major_digits = reader.take_dot_and_digits();
     const std::string_view minor_digits = reader.take_dot_and_digits();
     if (year_digits.empty() || release_letters.empty() || !reader.is_at_end()) {
-        // Other programs look for this text, so it keeps its number: that of the parts found.
+        // Other programs look for this text, so it keeps its number, which is always 0.
         warn("Cannot parse version string %s, results.size() = %d", text.c_str(), 0);
         warn("Cannot parse version string %s", text.c_str());
         *this = vorl_version{};

@@ -70,8 +70,9 @@ void select_and_activate() {
         return;
     }
 
-    // An update is measured against what the links named at the start-up, even when that has just
-    // been rejected. What it replaces is then the system data set.
+    // An update must be newer than the data set that the zoneinfo link named when the start-up
+    // began. This holds even when that data set has just been rejected. The update then replaces
+    // the system data set.
     const vorl_dataset update{latest_path};
     if (!update.compatible_with(system) || !update.newer_than(current)) {
         warn("New update not compatible or older version: %s vs. %s", update.version_text().c_str(),

@@ -5,13 +5,13 @@
 namespace initialiser {
 
 // Chooses a data set, and points the system's links at it:
-// - the system data set, when the links can't be read, or the data that they name have another ICU
-//   schema than the system's or are older than those;
+// - the system data set, when the zoneinfo link can't be read, or when the data set that it names
+//   has another ICU schema than the system's or is older than the system's;
 // - the update that the latest link names, when it has the system's ICU schema and is newer than
-//   the data set that the links named. The version-difference record is then written.
-// Links that are in order are not touched. When a stored data set is abandoned, makes the cleanup
-// marker. After a failure, prints a line and resets the links to the system data set. Throws only
-// when that fails.
+//   the data set that the zoneinfo link named. The version-difference record is then written.
+// Otherwise the links stay: where the zoneinfo link is in order, the ICU link is not looked at.
+// When a stored data set is abandoned, makes the cleanup marker. After a failure, prints a line and
+// resets the links to the system data set. Throws only when that fails.
 void select_and_activate_dataset();
 
 // The path of the data set whose tz database is at `target`; the empty path is the system data set.

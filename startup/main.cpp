@@ -23,9 +23,8 @@ int start_up() noexcept {
         select_and_activate_dataset();
     } catch (...) {
         warn("The time-zone links could not be reset");
-        // The zoneinfo link may be missing. Without it no zone can be found, and the repair would
-        // set the default zone in place of one in the old place. So the next start-up repairs the
-        // localtime link.
+        // Stop here: without a zoneinfo link every zone looks missing, and the repair would replace
+        // the user's zone by the default one.
         return EXIT_FAILURE;
     }
     try {

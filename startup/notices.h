@@ -10,8 +10,8 @@ namespace initialiser {
 // "Cannot touch file PATH".
 void touch_cleanup_marker() noexcept;
 
-// Makes "OLD_NEW", without a line end, the whole content of the version-difference record. Prints
-// nothing when it can't.
+// Overwrites the version-difference record with "OLD_NEW", without a line end. Prints nothing when
+// it can't.
 void write_version_diff_record(const std::string& old_version,
                                const std::string& new_version) noexcept;
 

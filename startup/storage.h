@@ -7,11 +7,12 @@ namespace initialiser {
 // is passed over and not made. Prints and throws nothing.
 void prepare_storage() noexcept;
 
-// Copies the ICU link of older systems into the storage area with its target text unchanged, unless
-// a link that leads somewhere is there already. Then removes the old link. A link that leads
-// nowhere counts as missing in both places. A failed copy prints its own line and "Could not
-// migrate OLD to NEW"; a failed removal prints its own line and "Could not remove OLD". Throws
-// nothing.
+// Moves the ICU link of older systems into the storage area, with its target text unchanged.
+// - An old link that leads nowhere is left alone.
+// - Where the storage area has an ICU link that leads somewhere, the old one is only removed.
+// - An ICU link that leads nowhere stays in the way: the copy fails, and the old one is removed.
+// A failed copy prints its own line and "Could not migrate OLD to NEW"; a failed removal prints its
+// own line and "Could not remove OLD". Throws nothing.
 void migrate_legacy_icutz() noexcept;
 
 } // namespace initialiser
