@@ -1,1 +1,0 @@
-export ICU_TIMEZONE_FILES_DIR=/var/db/timezone/icutz
