@@ -30,7 +30,7 @@ public:
     tree contents(bool stamped = false) const;
 
     // Fails the test, with what differs, unless the device holds just that.
-    void expect(const tree& expected) const;
+    void expect(const tree& expected, bool stamped = false) const;
 
     // One start-up of the real program. A command of the shell may do it in its own way: $program
     // starts the program, and $strace is strace, made ready for it. One that doesn't end is killed:

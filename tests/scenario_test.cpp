@@ -2,22 +2,32 @@
 
 #include <gtest/gtest.h>
 
+#include <cstddef>
+#include <filesystem>
 #include <fstream>
+#include <ostream>
 #include <regex>
+#include <set>
 #include <sstream>
 #include <stdexcept>
+#include <string>
+#include <vector>
 
 namespace initialiser {
 namespace {
 
 struct scenario {
     std::string name;
-    std::string command = {};
-    changes found = {};
-    std::vector<std::string> printed = {};
-    changes left = {};
+    std::string command;
+    changes found;
+    std::vector<std::string> printed;
+    changes left;
     int status = 0;
 };
+
+std::ostream& operator<<(std::ostream& out, const scenario& shown) {
+    return out << shown.name;
+}
 
 void add(changes& list, const changes& more) {
     list.insert(list.end(), more.begin(), more.end());
@@ -54,21 +64,43 @@ std::vector<scenario> scenarios() {
     std::vector<scenario> all;
     const std::regex form{R"(\s*(\S*)\s*((\S*) ?(.*?))\s*)"};
     std::smatch parts;
-    for (const std::string kind : {"datasets", "links", "faults"}) {
-        std::ifstream file{VORL_SCENARIOS "/" + kind + ".txt"};
+    std::set<std::filesystem::path> files;
+    for (const auto& entry : std::filesystem::directory_iterator{VORL_SCENARIOS}) {
+        if (entry.path().extension() == ".txt") {
+            files.insert(entry.path());
+        }
+    }
+    for (const auto& path : files) {
+        const std::size_t before = all.size();
+        std::ifstream file{path};
         for (std::string line; std::getline(file, line);) {
             if (std::regex_match(line, parts, form) && parts[1] == "scenario") {
-                all.push_back({kind + "_" + parts[3].str()});
+                all.emplace_back().name = path.stem().string() + "_" + parts[3].str();
             } else if (!parts[1].str().empty() && parts[1] != "#" &&
-                       (all.empty() || !add_line(all.back(), parts))) {
+                       (all.size() == before || !add_line(all.back(), parts))) {
                 throw std::runtime_error("no line of a scenario: " + line);
             }
         }
-        if (all.empty() || !all.back().name.starts_with(kind)) {
-            throw std::runtime_error(kind + ".txt holds no scenario, or can't be read");
+        if (all.size() == before) {
+            throw std::runtime_error(path.string() + " holds no scenario, or can't be read");
         }
     }
     return all;
+}
+
+void expect_messages(const std::string& found, const std::vector<std::string>& expected) {
+    std::istringstream lines{found};
+    std::string line;
+    for (const std::string& text : expected) {
+        if (!std::getline(lines, line)) {
+            ADD_FAILURE() << "missing message: " << text;
+        } else if (!(line + ": ").starts_with("vorl_initialiser: " + text + ": ")) {
+            ADD_FAILURE() << "message: " << line << "\n  instead of: " << text;
+        }
+    }
+    while (std::getline(lines, line)) {
+        ADD_FAILURE() << "one message too many: " << line;
+    }
 }
 
 class start_up : public testing::TestWithParam<scenario> {};
@@ -76,20 +108,12 @@ class start_up : public testing::TestWithParam<scenario> {};
 TEST_P(start_up, prints_and_leaves) {
     const auto& [name, command, found, printed, left, status] = GetParam();
     const vorl_device device{found};
-    const tree expected = after(device.contents(), left);
-    const tree untouched = device.contents(true);
+    const bool stamped = left.empty();
+    const tree expected = after(device.contents(stamped), left);
     const outcome outcome = device.start_up(command);
     EXPECT_EQ(outcome.status, status);
-    std::istringstream lines{outcome.printed};
-    std::string line;
-    for (const std::string& text : printed) {
-        std::getline(lines, line);
-        EXPECT_TRUE((line + ": ").starts_with("vorl_initialiser: " + text + ": "))
-            << line << " is not " << text;
-    }
-    EXPECT_FALSE(std::getline(lines, line)) << line;
-    device.expect(expected);
-    EXPECT_TRUE(!left.empty() || device.contents(true) == untouched);
+    expect_messages(outcome.printed, printed);
+    device.expect(expected, stamped);
 }
 
 // A doubled name stops the test program.
