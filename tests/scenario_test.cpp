@@ -7,7 +7,6 @@
 #include <fstream>
 #include <ostream>
 #include <regex>
-#include <set>
 #include <sstream>
 #include <stdexcept>
 #include <string>
@@ -29,24 +28,23 @@ std::ostream& operator<<(std::ostream& out, const scenario& shown) {
     return out << shown.name;
 }
 
-void add(changes& list, const changes& more) {
-    list.insert(list.end(), more.begin(), more.end());
-}
-
 // False where there is no such verb.
 bool add_line(scenario& shown, const std::smatch& line) {
     const std::string verb = line[1];
     const std::string text = line[2]; // a word and the rest
     const std::string word = line[3];
     const std::string rest = line[4];
+    changes& list =
+        verb == "leaves" || verb == "turns_to" || verb == "installs" ? shown.left : shown.found;
     if (verb == "found" || verb == "leaves") {
-        add(verb == "found" ? shown.found : shown.left, {{word, rest}});
+        list.emplace_back(word, rest);
     } else if (verb == "offers") {
-        add(shown.found, {{"tz_latest", "-> /var/db/timezone/tz/" + word}});
+        list.emplace_back("tz_latest", "-> /var/db/timezone/tz/" + word);
     } else if (verb == "uses" || verb == "turns_to" || verb == "installs") {
-        add(verb == "uses" ? shown.found : shown.left, links_on(word));
+        const changes links = links_on(word);
+        list.insert(list.end(), links.begin(), links.end());
         if (rest.starts_with("over ")) {
-            add(shown.left, {{"TZVersionDiffRecord", "= " + rest.substr(5) + "_" + word}});
+            list.emplace_back("TZVersionDiffRecord", "= " + rest.substr(5) + "_" + word);
         }
     } else if (verb == "prints") {
         shown.printed.push_back(text);
@@ -64,13 +62,11 @@ std::vector<scenario> scenarios() {
     std::vector<scenario> all;
     const std::regex form{R"(\s*(\S*)\s*((\S*) ?(.*?))\s*)"};
     std::smatch parts;
-    std::set<std::filesystem::path> files;
     for (const auto& entry : std::filesystem::directory_iterator{VORL_SCENARIOS}) {
-        if (entry.path().extension() == ".txt") {
-            files.insert(entry.path());
+        const std::filesystem::path& path = entry.path();
+        if (path.extension() != ".txt") {
+            continue;
         }
-    }
-    for (const auto& path : files) {
         const std::size_t before = all.size();
         std::ifstream file{path};
         for (std::string line; std::getline(file, line);) {
@@ -90,15 +86,14 @@ std::vector<scenario> scenarios() {
 
 void expect_messages(const std::string& found, const std::vector<std::string>& expected) {
     std::istringstream lines{found};
-    std::string line;
     for (const std::string& text : expected) {
-        if (!std::getline(lines, line)) {
-            ADD_FAILURE() << "missing message: " << text;
-        } else if (!(line + ": ").starts_with("vorl_initialiser: " + text + ": ")) {
-            ADD_FAILURE() << "message: " << line << "\n  instead of: " << text;
+        std::string line;
+        std::getline(lines, line);
+        if (!(line + ": ").starts_with("vorl_initialiser: " + text + ": ")) {
+            ADD_FAILURE() << '"' << line << "\" instead of \"" << text << '"';
         }
     }
-    while (std::getline(lines, line)) {
+    for (std::string line; std::getline(lines, line);) {
         ADD_FAILURE() << "one message too many: " << line;
     }
 }

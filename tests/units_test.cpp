@@ -1,7 +1,6 @@
 #include "dataset/dataset.h"
 #include "dataset/icu.h"
 #include "foundation/file_system.h"
-#include "foundation/paths.h"
 #include "foundation/text_file.h"
 #include "foundation/version.h"
 #include "harness.h"
@@ -11,6 +10,7 @@
 
 #include <cstddef>
 #include <cstdio>
+#include <iterator>
 #include <regex>
 #include <stdexcept>
 #include <string>
@@ -33,8 +33,7 @@ std::vector<std::string> texts(const std::string& beginning, std::size_t more,
     return all;
 }
 
-// Beside the ends of each range of bytes the alphabets have their neighbours and bytes of other
-// kinds.
+// The alphabets have the ends of each range of bytes, their neighbours, and bytes of other kinds.
 TEST(version, has_its_form) {
     const std::regex form{R"(([0-9]+)([a-z]+)(?:\.([0-9]+))?(?:\.([0-9]+))?)"};
     const auto number = [](const std::string& digits) {
@@ -86,12 +85,10 @@ TEST(version, is_strictly_and_totally_ordered) {
     const std::vector<std::string> ascending = {
         "",        "2019aa",     "2019b",  "2019c", "2019c.0", "2019c.1",         "2019c.1.0",
         "2019c.2", "2019c.10.0", "2019ca", "2019d", "02020a",  "2020a.2147483647"};
-    for (auto one = ascending.begin(); one != ascending.end(); ++one) {
-        for (auto other = ascending.begin(); other != ascending.end(); ++other) {
-            SCOPED_TRACE(*one + " and " + *other);
-            EXPECT_EQ(vorl_version{*one}.newer_than(vorl_version{*other}), one > other);
-            EXPECT_EQ(vorl_version{*one}.equals(vorl_version{*other}), one == other);
-        }
+    for (auto newer = std::next(ascending.begin()); newer != ascending.end(); ++newer) {
+        const vorl_version older{*std::prev(newer)};
+        EXPECT_TRUE(vorl_version{*newer}.newer_than(older)) << *newer;
+        EXPECT_FALSE(older.newer_than(vorl_version{*newer}) || older.newer_than(older)) << *newer;
     }
 }
 
@@ -120,13 +117,12 @@ TEST(dataset, is_found_by_its_path) {
     for (const std::string& path : {area + "tz/", area + "tz2/x", "/" + area + "tz/x"}) {
         EXPECT_THROW(vorl_dataset{path}, std::invalid_argument) << path;
     }
-    for (const auto& [target, path] : tree{{"/usr/share/zoneinfo.default", ""},
-                                           {area + "tz/a/b/zoneinfo", area + "tz/a/b"},
-                                           {area + "tz/x/", area + "tz/x"}}) {
-        EXPECT_EQ(dataset_path_of_zoneinfo_link(target), path);
-    }
-    for (const std::string& target : {std::string{"tz/x/zoneinfo"}, area + "tz/", area + "tz/x",
-                                      area + "tz//x", system_zoneinfo + "s"}) {
+    EXPECT_EQ(dataset_path_of_zoneinfo_link("/usr/share/zoneinfo.default"), "");
+    EXPECT_EQ(dataset_path_of_zoneinfo_link(area + "tz/a/b/zoneinfo"), area + "tz/a/b");
+    EXPECT_EQ(dataset_path_of_zoneinfo_link(area + "tz/x/"), area + "tz/x");
+    for (const std::string& target :
+         {area + "tz/", area + "tz/x", area + "tz//x", std::string{"tz/x/"},
+          std::string{"/usr/share/zoneinfo.defaults"}}) {
         EXPECT_THROW(dataset_path_of_zoneinfo_link(target), int) << target;
     }
 }
