@@ -25,7 +25,9 @@ if latest=$(readlink $db/tz_latest) && [ -e "$latest/icutz/icutz$schema.dat" ] &
     newer "${latest##*/}" "$current_version"; then
     rm -f $db/zoneinfo $db/icutz /var/db/icutz
     ln -s "$latest/zoneinfo" "$latest/icutz" $db
-    [ "$current" = $system ] || touch $db/needs_cleanup
+    if [ "$current" != $system ]; then
+        touch $db/needs_cleanup
+    fi
     printf %s "${current_version}_${latest##*/}" >$db/TZVersionDiffRecord
 fi
 
