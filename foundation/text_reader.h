@@ -11,14 +11,17 @@ public:
 
     bool is_at_end() const { return rest_.empty(); }
 
-    // Takes `word` where the text goes on with it; false where it doesn't.
+    // Takes `word` and returns true where the text goes on with it. Else takes nothing and returns
+    // false.
     bool take(std::string_view word) {
-        const bool is_next = rest_.starts_with(word);
-        rest_.remove_prefix(is_next ? word.size() : 0);
-        return is_next;
+        if (!rest_.starts_with(word)) {
+            return false;
+        }
+        rest_.remove_prefix(word.size());
+        return true;
     }
 
-    // Takes and returns all that comes before the first byte that is none of `bytes`.
+    // Takes and returns all bytes up to the first that is not among `bytes`.
     std::string_view take_all_of(std::string_view bytes) {
         const std::string_view taken = rest_.substr(0, rest_.find_first_not_of(bytes));
         rest_.remove_prefix(taken.size());
