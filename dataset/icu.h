@@ -14,7 +14,8 @@ public:
     // Finds the schema of the ICU files of the data set at `path`; the empty path is the system
     // data set. When there is no schema, it is empty, and for a stored data set "No ICU schema
     // found for PATH" is printed. Without memory to walk the directory, prints "tz_icu::initialize:
-    // fts_open of DIRECTORY failed, REASON" and throws the error number.
+    // fts_open of DIRECTORY failed, REASON" and throws the error number. Throws no_error_number
+    // when the system's schema is too long (see read_first_word).
     explicit vorl_icu(const std::string& path = {});
 
     // True when both schemas are the same text, the empty one included. For a component of another
@@ -22,9 +23,9 @@ public:
     // returns false.
     bool compatible_schema(const vorl_dataset_component& other) const override;
 
-    // Removes the ICU link and the legacy one. For a stored data set, points the ICU link at its
-    // files; the system data set has no ICU link. Prints "unlink of ICU softlink failed" when a
-    // link can't be removed.
+    // Removes the ICU link, then the legacy one. For a stored data set, points the ICU link at its
+    // files; the system data set has no ICU link. Where one can't be removed, prints "unlink of ICU
+    // softlink failed" and removes no other.
     void install_links() const override;
 
 private:

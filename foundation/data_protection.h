@@ -5,9 +5,9 @@
 
 #include <string>
 
-// Data-protection classes say when the keys to a file are at hand. Linux has none. These are
-// stand-ins for the platform's calls: they take the same arguments and do the part that needs no
-// classes.
+// A file's data-protection class says when the file can be read. Linux has no such classes. These
+// are stand-ins for the platform's calls: they take the same arguments and do the part that needs
+// no classes.
 namespace initialiser {
 
 // Class 4: readable at all times, before the first unlock too, as everything needed at start-up is.

@@ -14,15 +14,14 @@
 namespace initialiser {
 
 // A walk over the entries of one directory, in the order in which the file system yields them. It
-// reads no further than it is asked to and never looks below the directory, so it costs no more
-// than the entries before the one sought.
+// stops at the entry sought and never looks below the directory.
 class vorl_directory_walk {
 public:
     // Opens the walk; `path` itself may be a link. The walk has no entries when the directory is
     // missing or can't be read, or when something else stands there.
     explicit vorl_directory_walk(const std::string& path)
         : directory_(repeat_interrupted([&] { return ::opendir(path.c_str()); })),
-          opening_error_(directory_ == nullptr && errno == ENOMEM ? ENOMEM : 0) {}
+          opening_error_((directory_ == nullptr && errno == ENOMEM) ? ENOMEM : 0) {}
 
     // The error number when there was no memory to open the walk, otherwise 0.
     int opening_error() const { return opening_error_; }

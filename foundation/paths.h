@@ -2,7 +2,7 @@
 
 #include <string>
 
-// Every fixed path and name on the device, written once.
+// Every fixed path and name on the device. No other file spells one out.
 namespace initialiser {
 
 // The storage area: what the updater and the initialiser keep, and the rest of the system reads.

@@ -8,8 +8,8 @@ namespace initialiser {
 // Makes a call to the system, and makes it again while it is interrupted (EINTR). No signal handler
 // is installed here, so a local disk never interrupts a call; a file system that a process serves,
 // such as FUSE, may. The number of repetitions has a bound, so that it can't hold up the start-up
-// for ever. Returns the last call's result. The error number is that of the failure, or what it was
-// before.
+// for ever. Returns the last call's result. After a failure errno is that failure's; after a
+// success it is unchanged.
 template <typename call> auto repeat_interrupted(const call& make) noexcept {
     constexpr int most_repetitions = 1000;
     const auto failed = [](const auto result) {

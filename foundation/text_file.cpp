@@ -92,7 +92,7 @@ std::string read_first_word(const std::string& path) {
 }
 
 void write_text(const std::string& path, const std::string& text) noexcept {
-    // Truncated by itself, not at the open: only then is it known to be a regular file.
+    // Truncated after the open, not by it: only an open file is known to be regular.
     const vorl_descriptor file = open_for_writing(path);
     if (!file.is_open() || repeat_interrupted([&] { return ::ftruncate(file.number(), 0); }) != 0) {
         return;

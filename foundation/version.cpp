@@ -11,6 +11,7 @@
 namespace initialiser {
 namespace {
 
+// Throws what stoi throws for a number that is too large.
 std::int32_t number_or_absent(std::string_view digits) {
     return digits.empty() ? vorl_version::absent : std::stoi(std::string{digits});
 }

@@ -71,8 +71,8 @@ void select_and_activate() {
     }
 
     // An update must be newer than the data set that the zoneinfo link named when the start-up
-    // began. This holds even when that data set has just been rejected. The update then replaces
-    // the system data set.
+    // began, even when that data set has just been rejected. In that case the update replaces the
+    // system data set.
     const vorl_dataset update{latest_path};
     if (!update.compatible_with(system) || !update.newer_than(current)) {
         warn("New update not compatible or older version: %s vs. %s", update.version_text().c_str(),

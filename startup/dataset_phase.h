@@ -5,8 +5,8 @@
 namespace initialiser {
 
 // Chooses a data set, and points the system's links at it:
-// - the system data set, when the zoneinfo link can't be read, or when the data set that it names
-//   has another ICU schema than the system's or is older than the system's;
+// - the system data set, when the zoneinfo link is missing, can't be read or names no data set, or
+//   when its data set has another ICU schema than the system's or is older than the system's;
 // - the update that the latest link names, when it has the system's ICU schema and is newer than
 //   the data set that the zoneinfo link named. The version-difference record is then written.
 // Otherwise the links stay: where the zoneinfo link is in order, the ICU link is not looked at.

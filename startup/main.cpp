@@ -23,8 +23,8 @@ int start_up() noexcept {
         select_and_activate_dataset();
     } catch (...) {
         warn("The time-zone links could not be reset");
-        // Stop here: without a zoneinfo link every zone looks missing, and the repair would replace
-        // the user's zone by the default one.
+        // Stop here: without a zoneinfo link, the zone of a localtime link in the old place looks
+        // missing, and the repair would set the default zone.
         return EXIT_FAILURE;
     }
     try {

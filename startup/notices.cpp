@@ -18,7 +18,7 @@ namespace {
 
 constexpr mode_t marker_mode = 0666; // less the process's mask
 
-// A planted link must not make a file elsewhere, and a FIFO's reader is not waited for.
+// A planted link must not make a file elsewhere, and what stands there must not hold up the open.
 constexpr int marker_flags = O_RDWR | O_CREAT | O_NOFOLLOW | O_NONBLOCK | O_NOCTTY | O_CLOEXEC;
 
 bool open_and_close_marker() noexcept {

@@ -11,8 +11,8 @@
 namespace initialiser {
 namespace {
 
-// Fills each closed number from 0 to 2 with a descriptor that can't be read or written. It is one
-// of the root directory, since a bare root has no /dev/null.
+// Fills each closed number from 0 to 2 with a descriptor that can't be read or written; the first
+// above 2 is closed again. They are of the root directory, since a bare root has no /dev/null.
 void occupy_standard_descriptors() noexcept {
     int filler = 0;
     while (filler >= 0 && filler <= STDERR_FILENO) {
